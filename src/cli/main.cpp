@@ -1,0 +1,69 @@
+// Veltrix — KPI dashboard for small businesses.
+// veltrix-cli: the program's core without windows, for scripts, provisioning and tests.
+
+#include "passwordverbs.h"
+
+#include <QCoreApplication>
+#include <QTextStream>
+
+#include <functional>
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+struct Verb
+{
+    QString name;
+    QString arguments;
+    QString summary;
+    std::function<int(const QStringList &)> run;
+};
+
+const QList<Verb> &verbs()
+{
+    static const QList<Verb> all = {
+        {u"encrypt-password"_s, u"TEXT"_s, u"print the stored form of an accounting password"_s,
+         PasswordVerbs::encryptPassword},
+        {u"decrypt-password"_s, u"STORED"_s, u"print the password a stored value holds"_s,
+         PasswordVerbs::decryptPassword},
+    };
+    return all;
+}
+
+int usage(QTextStream &out)
+{
+    out << "usage: veltrix-cli VERB [ARGUMENTS]\n\nverbs:\n";
+    for (const Verb &verb : verbs())
+        out << "  " << verb.name << ' ' << verb.arguments << "\n      " << verb.summary << '\n';
+    out.flush();
+    return 2;
+}
+
+} // namespace
+
+int main(int argc, char *argv[])
+{
+    QCoreApplication app(argc, argv);
+    QCoreApplication::setOrganizationName(u"Veltrix"_s);
+    QCoreApplication::setApplicationName(u"veltrix"_s);
+
+    QStringList arguments = QCoreApplication::arguments().mid(1);
+    if (arguments.isEmpty()) {
+        QTextStream err(stderr);
+        return usage(err);
+    }
+    const QString name = arguments.takeFirst();
+    if (name == u"help"_s || name == u"--help"_s || name == u"-h"_s) {
+        QTextStream out(stdout);
+        usage(out);
+        return 0;
+    }
+    for (const Verb &verb : verbs()) {
+        if (verb.name == name)
+            return verb.run(arguments);
+    }
+    QTextStream err(stderr);
+    err << "veltrix-cli: unknown verb '" << name << "'\n\n";
+    return usage(err);
+}

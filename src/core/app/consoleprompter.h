@@ -1,0 +1,17 @@
+// Veltrix — KPI dashboard for small businesses.
+#pragma once
+
+#include "prompter.h"
+
+// The prompter of the headless tool: messages go to standard error, questions take their
+// first button, and nothing is ever chosen from a file dialog.
+class ConsolePrompter final : public Prompter
+{
+public:
+    Answer message(const QString &text, const QString &title, Icon icon,
+                   Buttons buttons = Buttons::Ok) override;
+    void setBusyPointer() override {}
+    void setNormalPointer() override {}
+    QString chooseFile(const QString &, const QString &, const QString &) override { return {}; }
+    QString chooseFolder(const QString &, const QString &) override { return {}; }
+};

@@ -1,0 +1,15 @@
+// Veltrix — KPI dashboard for small businesses.
+#pragma once
+
+#include <QByteArray>
+#include <QString>
+
+// The Western European single-byte code page, which stored passwords are written in whatever
+// the platform's own code page, so that a stored value means the same bytes everywhere.
+namespace Windows1252 {
+
+// Characters the code page cannot hold become "?".
+QByteArray fromUnicode(const QString &text);
+QString toUnicode(const QByteArray &bytes);
+
+} // namespace Windows1252

@@ -1,0 +1,30 @@
+// Veltrix — KPI dashboard for small businesses.
+#pragma once
+
+#include "app/prompter.h"
+
+#include <QPointer>
+#include <QWidget>
+
+// Message boxes, the wait cursor and the file dialogs of the desktop.
+class QtPrompter final : public Prompter
+{
+public:
+    QtPrompter() = default;
+    ~QtPrompter() override;
+
+    // Dialogs open over this window when it is set.
+    void setParentWindow(QWidget *window) { m_parent = window; }
+
+    Answer message(const QString &text, const QString &title, Icon icon,
+                   Buttons buttons = Buttons::Ok) override;
+    void setBusyPointer() override;
+    void setNormalPointer() override;
+    QString chooseFile(const QString &title, const QString &startPath,
+                       const QString &filter) override;
+    QString chooseFolder(const QString &title, const QString &startPath) override;
+
+private:
+    QPointer<QWidget> m_parent;
+    int m_busyDepth = 0;
+};

@@ -1,0 +1,44 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "widgetplacement.h"
+
+#include "app/windowplacement.h"
+
+#include <QScreen>
+#include <QWidget>
+
+namespace WidgetPlacement {
+
+namespace {
+
+WindowPlacement placementFor(const QWidget &window, SettingsStore &store)
+{
+    const QScreen *screen = window.screen();
+    const double dpi = screen ? screen->logicalDotsPerInch() : 96.0;
+    return WindowPlacement(store, WindowPlacement::twipsPerPixelAt(dpi));
+}
+
+} // namespace
+
+void saveWindowPlacement(const QWidget &window, SettingsStore &store)
+{
+    WindowPlacement::State state = WindowPlacement::State::Normal;
+    if (window.isMinimized())
+        state = WindowPlacement::State::Minimised;
+    else if (window.isMaximized())
+        state = WindowPlacement::State::Maximised;
+    const QRect normal(window.pos(), window.size());
+    placementFor(window, store).save(window.objectName(), normal, state);
+}
+
+void restoreWindowPlacement(QWidget &window, SettingsStore &store, bool skipState)
+{
+    const WindowPlacement placement = placementFor(window, store);
+    const QRect restored =
+        placement.restore(window.objectName(), QRect(window.pos(), window.size()));
+    window.move(restored.topLeft());
+    window.resize(restored.size());
+    if (!skipState && placement.savedState(window.objectName()) == WindowPlacement::State::Maximised)
+        window.setWindowState(window.windowState() | Qt::WindowMaximized);
+}
+
+} // namespace WidgetPlacement

@@ -1,0 +1,187 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "cipher/huffmancodec.h"
+
+#include <QRandomGenerator>
+#include <QTest>
+#include <QtEndian>
+
+namespace {
+
+// Packs a run of bits written as text ("0110"), least significant bit first.
+QByteArray packBits(const QByteArray &bits)
+{
+    QByteArray bytes((bits.size() + 7) / 8, '\0');
+    for (qsizetype t = 0; t < bits.size(); ++t) {
+        if (bits[t] == '1')
+            bytes[t / 8] = char(bytes[t / 8] | (1 << (t % 8)));
+    }
+    return bytes;
+}
+
+// A coded container built by hand from a code table of our choosing.
+QByteArray codedContainer(const QByteArray &plain, const QMap<char, QByteArray> &codes,
+                          std::optional<quint32> lengthOverride = std::nullopt)
+{
+    quint8 check = 0;
+    for (const char c : plain)
+        check ^= quint8(c);
+    QByteArray out("HE3\r");
+    out.append(char(check));
+    char number[4];
+    qToLittleEndian<quint32>(lengthOverride.value_or(quint32(plain.size())), number);
+    out.append(number, 4);
+    qToLittleEndian<quint16>(quint16(codes.size()), number);
+    out.append(number, 2);
+    QByteArray tableBits;
+    for (auto it = codes.cbegin(); it != codes.cend(); ++it) {
+        out.append(it.key());
+        out.append(char(it.value().size()));
+        tableBits += it.value();
+    }
+    out += packBits(tableBits);
+    QByteArray dataBits;
+    for (const char c : plain)
+        dataBits += codes.value(c);
+    out += packBits(dataBits);
+    return out;
+}
+
+} // namespace
+
+class TestHuffmanCodec : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void roundTrips_data();
+    void roundTrips();
+    void writesTheDocumentedLayout();
+    void emptyInputIsAStoredContainer();
+    void decodesCodesItDidNotChoose_data();
+    void decodesCodesItDidNotChoose();
+    void refusesDamagedContainers_data();
+    void refusesDamagedContainers();
+    void reportsCheckByteMismatch();
+};
+
+void TestHuffmanCodec::roundTrips_data()
+{
+    QTest::addColumn<QByteArray>("bytes");
+    QTest::newRow("short password") << QByteArray("secret");
+    QTest::newRow("two values") << QByteArray("abababababbbbbba");
+    QTest::newRow("skewed frequencies") << QByteArray(1000, 'a') + QByteArray("bcdefgh");
+    QByteArray all;
+    for (int round = 0; round < 4; ++round) {
+        for (int b = 0; b < 256; ++b)
+            all.append(char(b));
+    }
+    QTest::newRow("every byte value") << all;
+    QRandomGenerator random(3);
+    QByteArray text;
+    for (int i = 0; i < 20000; ++i)
+        text.append(char('a' + random.bounded(26) * random.bounded(2)));
+    QTest::newRow("long text") << text;
+}
+
+void TestHuffmanCodec::roundTrips()
+{
+    QFETCH(QByteArray, bytes);
+    const HuffmanCodec::Decoded decoded = HuffmanCodec::decode(HuffmanCodec::encode(bytes));
+    QCOMPARE(decoded.status, HuffmanCodec::Status::Ok);
+    QCOMPARE(decoded.bytes, bytes);
+}
+
+void TestHuffmanCodec::writesTheDocumentedLayout()
+{
+    // Frequencies 4, 2, 1, 1 give code lengths 1, 2, 3 and 3 whatever the tie-breaks.
+    const QByteArray plain("aaaabbcd");
+    const QByteArray container = HuffmanCodec::encode(plain);
+    QVERIFY(container.startsWith("HE3\r"));
+    QCOMPARE(quint8(container[4]), quint8('a' ^ 'a' ^ 'a' ^ 'a' ^ 'b' ^ 'b' ^ 'c' ^ 'd'));
+    QCOMPARE(qFromLittleEndian<quint32>(container.constData() + 5), quint32(8));
+    QCOMPARE(qFromLittleEndian<quint16>(container.constData() + 9), quint16(4));
+    QCOMPARE(container.mid(11, 8), QByteArray("a\x01" "b\x02" "c\x03" "d\x03", 8));
+    // 9 bits of codes take two bytes; 4 + 4 + 3 + 3 = 14 bits of data take two more.
+    QCOMPARE(container.size(), 11 + 8 + 2 + 2);
+    // The last byte of the table has its unused high bits clear.
+    QCOMPARE(quint8(container[20]) & 0xFE, 0);
+}
+
+void TestHuffmanCodec::emptyInputIsAStoredContainer()
+{
+    QCOMPARE(HuffmanCodec::encode({}), QByteArray("HE0\r"));
+    const HuffmanCodec::Decoded decoded = HuffmanCodec::decode(QByteArray("HE0\r"));
+    QCOMPARE(decoded.status, HuffmanCodec::Status::Ok);
+    QCOMPARE(decoded.bytes, QByteArray());
+}
+
+void TestHuffmanCodec::decodesCodesItDidNotChoose_data()
+{
+    QTest::addColumn<QByteArray>("plain");
+    QTest::addColumn<QByteArray>("container");
+    QTest::newRow("ones first")
+        << QByteArray("secrete!")
+        << codedContainer("secrete!", {{'e', "1"}, {'c', "011"}, {'r', "010"}, {'t', "001"},
+                                       {'s', "0001"}, {'!', "0000"}});
+    QTest::newRow("lengths beyond need")
+        << QByteArray("abcab")
+        << codedContainer("abcab", {{'a', "0"}, {'b', "10"}, {'c', "1110"}});
+    QTest::newRow("no data") << QByteArray() << codedContainer({}, {});
+}
+
+void TestHuffmanCodec::decodesCodesItDidNotChoose()
+{
+    QFETCH(QByteArray, plain);
+    QFETCH(QByteArray, container);
+    const HuffmanCodec::Decoded decoded = HuffmanCodec::decode(container);
+    QCOMPARE(decoded.status, HuffmanCodec::Status::Ok);
+    QCOMPARE(decoded.bytes, plain);
+}
+
+void TestHuffmanCodec::refusesDamagedContainers_data()
+{
+    QTest::addColumn<QByteArray>("container");
+    QTest::addColumn<HuffmanCodec::Status>("status");
+    const QMap<char, QByteArray> codes{{'a', "0"}, {'b', "10"}, {'c', "11"}};
+    const QByteArray good = codedContainer("abcabc", codes);
+
+    QTest::newRow("unknown tag") << QByteArray("HE4\rabc") << HuffmanCodec::Status::NotIdentified;
+    QTest::newRow("too short for a tag") << QByteArray("HE") << HuffmanCodec::Status::NotIdentified;
+    QTest::newRow("header cut short") << good.left(9) << HuffmanCodec::Status::Corrupt;
+    QTest::newRow("table cut short") << good.left(13) << HuffmanCodec::Status::Corrupt;
+    QTest::newRow("data cut short") << good.left(good.size() - 1) << HuffmanCodec::Status::Corrupt;
+    QTest::newRow("length far beyond the data")
+        << codedContainer("abcabc", codes, 0xFFFFFFFFu) << HuffmanCodec::Status::Corrupt;
+    QTest::newRow("one code the prefix of another")
+        << codedContainer("ab", {{'a', "1"}, {'b', "10"}}) << HuffmanCodec::Status::Corrupt;
+    QTest::newRow("two values with one code")
+        << codedContainer("ab", {{'a', "01"}, {'b', "01"}}) << HuffmanCodec::Status::Corrupt;
+    QTest::newRow("code of no bits")
+        << codedContainer("a", {{'a', ""}, {'b', "1"}}) << HuffmanCodec::Status::Corrupt;
+    QByteArray strayBits = codedContainer("ab", {{'a', "00"}, {'b', "01"}});
+    strayBits.back() = char(0xFF); // "11" is no code
+    QTest::newRow("data leads outside the codes") << strayBits << HuffmanCodec::Status::Corrupt;
+    QByteArray tooManyValues = good;
+    tooManyValues[9] = char(0x01);
+    tooManyValues[10] = char(0x01); // 257 values
+    QTest::newRow("more values than bytes have") << tooManyValues << HuffmanCodec::Status::Corrupt;
+}
+
+void TestHuffmanCodec::refusesDamagedContainers()
+{
+    QFETCH(QByteArray, container);
+    QFETCH(HuffmanCodec::Status, status);
+    QCOMPARE(HuffmanCodec::decode(container).status, status);
+}
+
+void TestHuffmanCodec::reportsCheckByteMismatch()
+{
+    QByteArray container = codedContainer("abcabc", {{'a', "0"}, {'b', "10"}, {'c', "11"}});
+    container[4] = char(container[4] ^ 1);
+    const HuffmanCodec::Decoded decoded = HuffmanCodec::decode(container);
+    QCOMPARE(decoded.status, HuffmanCodec::Status::ChecksumMismatch);
+    QCOMPARE(decoded.bytes, QByteArray("abcabc"));
+}
+
+QTEST_GUILESS_MAIN(TestHuffmanCodec)
+#include "tst_huffmancodec.moc"

@@ -1,0 +1,353 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "cipher/base64armour.h"
+#include "cipher/huffmancodec.h"
+#include "cipher/keystream.h"
+#include "cipher/passwordcipher.h"
+#include "cipher/windows1252.h"
+
+#include <QRandomGenerator>
+#include <QTest>
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+const QString Key = u"Rv5HnW2j"_s;
+
+// A fixed 40-byte header, so that values written elsewhere can be rebuilt byte for byte.
+QByteArray fixedHeader()
+{
+    QByteArray header(1, char(40));
+    for (int i = 0; i < 39; ++i)
+        header.append(char((i * 37 + 11) % 256));
+    return header;
+}
+
+QString armour(const QByteArray &framed, const QString &key = Key)
+{
+    KeyStream stream(Windows1252::fromUnicode(key), {});
+    return Base64Armour::encode(stream.encipher(framed), 9999);
+}
+
+QString randomSingleByteText(QRandomGenerator &random)
+{
+    const int length = 1 + int(random.bounded(64));
+    QByteArray bytes;
+    for (int i = 0; i < length; ++i) {
+        // Mostly printable, sometimes any byte, sometimes long runs of one character.
+        const quint32 kind = random.bounded(10);
+        if (kind < 6)
+            bytes.append(char(0x20 + random.bounded(0x5F)));
+        else if (kind < 9)
+            bytes.append(char(1 + random.bounded(255)));
+        else
+            bytes.append(QByteArray(int(random.bounded(20)), 'x'));
+    }
+    return Windows1252::toUnicode(bytes);
+}
+
+} // namespace
+
+class TestPasswordCipher : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void roundTripsThousandsOfTexts();
+    void sameTextEncryptsDifferentlyEachTime();
+    void emptyTextStaysEmpty();
+    void singleCharacterPasswordIsStored_data();
+    void singleCharacterPasswordIsStored();
+    void decryptsValuesWrittenElsewhere_data();
+    void decryptsValuesWrittenElsewhere();
+    void keyStreamMatchesItsDefinition();
+    void secondKeyChangesTheStream();
+    void failedDecryptionReturnsInputUnchanged_data();
+    void failedDecryptionReturnsInputUnchanged();
+    void wrongKeyIsRefused();
+    void keyUsability_data();
+    void keyUsability();
+    void errorMessages_data();
+    void errorMessages();
+    void unknownErrorNumberHasNoMessage();
+    void headerLengthStaysInRange();
+    void codePageRoundTripsEveryByte();
+    void codePageMapsSpecialCharacters_data();
+    void codePageMapsSpecialCharacters();
+    void armourBreaksLongLines();
+};
+
+void TestPasswordCipher::roundTripsThousandsOfTexts()
+{
+    QRandomGenerator random(20261206);
+    PasswordCipher cipher(&random);
+    for (int i = 0; i < 3000; ++i) {
+        const QString text = randomSingleByteText(random);
+        const QString stored = cipher.encryptText(text, Key);
+        QVERIFY(!stored.contains(u'\n'));
+        const QString back = cipher.decryptText(stored, Key);
+        QCOMPARE(cipher.cryptoError(), PasswordCipher::NoError);
+        QCOMPARE(back, text);
+    }
+}
+
+void TestPasswordCipher::sameTextEncryptsDifferentlyEachTime()
+{
+    PasswordCipher cipher;
+    const QString first = cipher.encryptText(u"workshop2024"_s, Key);
+    const QString second = cipher.encryptText(u"workshop2024"_s, Key);
+    QVERIFY(first != second);
+    QCOMPARE(cipher.decryptText(first, Key), u"workshop2024"_s);
+    QCOMPARE(cipher.decryptText(second, Key), u"workshop2024"_s);
+}
+
+void TestPasswordCipher::emptyTextStaysEmpty()
+{
+    PasswordCipher cipher;
+    QCOMPARE(cipher.encryptText(QString(), Key), QString());
+    QCOMPARE(cipher.cryptoError(), PasswordCipher::NoError);
+}
+
+void TestPasswordCipher::singleCharacterPasswordIsStored_data()
+{
+    QTest::addColumn<QString>("password");
+    QTest::newRow("one character") << u"q"_s;
+    QTest::newRow("one character repeated") << u"zzzzzzzzzz"_s;
+}
+
+void TestPasswordCipher::singleCharacterPasswordIsStored()
+{
+    QFETCH(QString, password);
+    const QByteArray container = HuffmanCodec::encode(Windows1252::fromUnicode(password));
+    QVERIFY(container.startsWith("HE0\r"));
+    QCOMPARE(container.sliced(4), Windows1252::fromUnicode(password));
+
+    PasswordCipher cipher;
+    QCOMPARE(cipher.decryptText(cipher.encryptText(password, Key), Key), password);
+}
+
+void TestPasswordCipher::decryptsValuesWrittenElsewhere_data()
+{
+    QTest::addColumn<QString>("stored");
+    QTest::addColumn<QString>("password");
+    // Written by an independent implementation of the same format, with the fixed header
+    // above: one stored as is, one Huffman-coded with codes this encoder would not choose.
+    QTest::newRow("stored container")
+        << u"GYxg2TqI8sbepAQLv4chh/rk8P14wmswP5FOtg9s8ENP/hcI/h4PeVaN1FPz88e5yKI="_s << u"zzzz"_s;
+    QTest::newRow("coded container")
+        << u"GYxg2TqI8sbepAQLv4chh/rk8P14wmswP5FOtg9s8ENP/hcI/h4PeVaN1zLOhROJb57hX1KEsHZnluzrvaJE2/W/0d0oreQ="_s
+        << u"secrete!"_s;
+    QTest::newRow("blanks around the value")
+        << u" \t\r\nGYxg2TqI8sbepAQLv4chh/rk8P14wmswP5FOtg9s8ENP/hcI/h4PeVaN1FPz88e5yKI=\r\n"_s
+        << u"zzzz"_s;
+}
+
+void TestPasswordCipher::decryptsValuesWrittenElsewhere()
+{
+    QFETCH(QString, stored);
+    QFETCH(QString, password);
+    PasswordCipher cipher;
+    QCOMPARE(cipher.decryptText(stored, Key), password);
+    QCOMPARE(cipher.cryptoError(), PasswordCipher::NoError);
+    QCOMPARE(cipher.cryptoErrorMessage(), QString());
+}
+
+void TestPasswordCipher::keyStreamMatchesItsDefinition()
+{
+    // Sixteen zero bytes enciphered: the stream itself, fed back byte by byte.
+    KeyStream stream(QByteArrayLiteral("Rv5HnW2j"), {});
+    QCOMPARE(stream.encipher(QByteArray(16, '\0')).toHex(),
+             QByteArrayLiteral("3100706a5fdf923be7394760d7f3281c"));
+}
+
+void TestPasswordCipher::secondKeyChangesTheStream()
+{
+    const QByteArray framed = fixedHeader() + QByteArrayLiteral("HE0\rCaf\xe9")
+                              + fixedHeader().right(2);
+    const QByteArray written = Base64Armour::decode(
+        u"Wr5iG7jhzZ20m5NE9yaHsw/6zAJ2DSlGITuWhtiK60MFUPjBfgQxD2MrMF0F4CMDGps="_s);
+    QCOMPARE(KeyStream(QByteArrayLiteral("Rv5HnW2j"), QByteArrayLiteral("Second")).decipher(written),
+             framed);
+    QVERIFY(KeyStream(QByteArrayLiteral("Rv5HnW2j"), {}).decipher(written) != framed);
+}
+
+void TestPasswordCipher::failedDecryptionReturnsInputUnchanged_data()
+{
+    QTest::addColumn<QString>("stored");
+    QTest::addColumn<QString>("key");
+    QTest::addColumn<int>("error");
+
+    const QByteArray header = fixedHeader();
+    const QByteArray footer = header.right(2);
+
+    QTest::newRow("empty") << QString() << Key << 1;
+    QTest::newRow("only blanks") << u" \t \r\n "_s << Key << 1;
+    QTest::newRow("key of four characters") << u"anything"_s << u"Rv5H"_s << 3;
+    QTest::newRow("key repeating a group") << u"anything"_s << u"abcabc"_s << 3;
+    QTest::newRow("password typed in clear") << u"hunter22"_s << Key << 33;
+    QTest::newRow("not Base64 at all") << u"my pass word!"_s << Key << 33;
+    QTest::newRow("shorter than one group") << u"abc"_s << Key << 33;
+    QTest::newRow("footer does not match")
+        << armour(header + QByteArrayLiteral("HE0\rabc") + QByteArrayLiteral("xy")) << Key << 33;
+    QTest::newRow("header longer than the value")
+        << armour(QByteArray(1, char(200)) + QByteArrayLiteral("HE0\rabc")) << Key << 33;
+    QTest::newRow("header length below two")
+        << armour(QByteArray(1, char(1)) + QByteArrayLiteral("HE0\rab")) << Key << 33;
+    QTest::newRow("container not identified")
+        << armour(header + QByteArrayLiteral("HE9\rabc") + footer) << Key << 33;
+    QTest::newRow("container cut short")
+        << armour(header + QByteArrayLiteral("HE3\r\x01\x05") + footer) << Key << 33;
+
+    // A coded container whose check byte disagrees with what it decodes to.
+    QByteArray coded = HuffmanCodec::encode(QByteArrayLiteral("secret password"));
+    QVERIFY(coded.startsWith("HE3\r"));
+    coded[4] = char(coded[4] ^ 0x5A);
+    QTest::newRow("check byte wrong") << armour(header + coded + footer) << Key << 5;
+}
+
+void TestPasswordCipher::failedDecryptionReturnsInputUnchanged()
+{
+    QFETCH(QString, stored);
+    QFETCH(QString, key);
+    QFETCH(int, error);
+    PasswordCipher cipher;
+    QCOMPARE(cipher.decryptText(stored, key), stored);
+    QCOMPARE(int(cipher.cryptoError()), error);
+    QCOMPARE(cipher.cryptoErrorMessage(), *PasswordCipher::cryptoErrorText(error));
+
+    // The outcome belongs to the last call only.
+    cipher.decryptText(cipher.encryptText(u"ok"_s, Key), Key);
+    QCOMPARE(cipher.cryptoError(), PasswordCipher::NoError);
+    QCOMPARE(cipher.cryptoErrorMessage(), QString());
+}
+
+void TestPasswordCipher::wrongKeyIsRefused()
+{
+    QRandomGenerator random(7);
+    PasswordCipher cipher(&random);
+    int refused = 0;
+    for (int i = 0; i < 200; ++i) {
+        const QString stored = cipher.encryptText(u"PanelBeater#1"_s, Key);
+        const QString result = cipher.decryptText(stored, u"Xq7LmP0z"_s);
+        if (cipher.cryptoError() != PasswordCipher::NoError) {
+            QCOMPARE(result, stored);
+            ++refused;
+        }
+    }
+    QCOMPARE(refused, 200);
+}
+
+void TestPasswordCipher::keyUsability_data()
+{
+    QTest::addColumn<QString>("key");
+    QTest::addColumn<bool>("usable");
+    QTest::newRow("the settings key") << Key << true;
+    QTest::newRow("four characters") << u"abcd"_s << false;
+    QTest::newRow("five different") << u"abcde"_s << true;
+    QTest::newRow("one character repeated") << u"aaaaa"_s << false;
+    QTest::newRow("three letters twice") << u"abcabc"_s << false;
+    QTest::newRow("two letters three times") << u"ababab"_s << false;
+    QTest::newRow("repetition with a shorter tail") << u"abcabca"_s << true;
+    QTest::newRow("repeat only at the start") << u"aabcd"_s << true;
+}
+
+void TestPasswordCipher::keyUsability()
+{
+    QFETCH(QString, key);
+    QFETCH(bool, usable);
+    QCOMPARE(PasswordCipher::keyIsUsable(key), usable);
+}
+
+void TestPasswordCipher::errorMessages_data()
+{
+    QTest::addColumn<int>("number");
+    QTest::addColumn<QString>("message");
+    QTest::newRow("0") << 0 << QString();
+    QTest::newRow("1") << 1 << u"Cannot continue without text (Error 1)"_s;
+    QTest::newRow("2") << 2 << u"Cannot continue without key (Error 2)"_s;
+    QTest::newRow("3") << 3 << u"Key too small/is repeating (Error 3)"_s;
+    QTest::newRow("4") << 4 << u"Source file not found (Error 4)"_s;
+    QTest::newRow("5") << 5 << u"Compression checksum error (Error 5)"_s;
+    QTest::newRow("6") << 6 << u"Cannot process empty file (Error 6)"_s;
+    QTest::newRow("10") << 10 << u"Crypto version unknown/contains errors (Error 10)"_s;
+    QTest::newRow("11") << 11 << u"Encoding has been aborted by user"_s;
+    QTest::newRow("12") << 12 << u"File error: Disk full (Error 12)"_s;
+    QTest::newRow("20") << 20 << u"Crypto file version unknown/contains errors (Error 20)"_s;
+    QTest::newRow("21") << 21 << u"Decoding has been aborted by user"_s;
+    QTest::newRow("22") << 22 << u"File error: Disk full (Error 22)"_s;
+    QTest::newRow("23") << 23 << u"Failed decoding the file (Error 23)"_s;
+    QTest::newRow("30") << 30
+                        << u"Crypto header or footer format incomplete/contains errors (Error 30)"_s;
+    QTest::newRow("33") << 33 << u"Failed decoding the text (Error 33)"_s;
+}
+
+void TestPasswordCipher::errorMessages()
+{
+    QFETCH(int, number);
+    QFETCH(QString, message);
+    QCOMPARE(PasswordCipher::cryptoErrorText(number, u"Disk full"_s), message);
+}
+
+void TestPasswordCipher::unknownErrorNumberHasNoMessage()
+{
+    QCOMPARE(PasswordCipher::cryptoErrorText(7), std::nullopt);
+    QCOMPARE(PasswordCipher::cryptoErrorText(-1), std::nullopt);
+}
+
+void TestPasswordCipher::headerLengthStaysInRange()
+{
+    QRandomGenerator random(99);
+    int shortest = 255;
+    int longest = 0;
+    for (int i = 0; i < 5000; ++i) {
+        const QByteArray header = PasswordCipher::makeHeader(random);
+        const int length = quint8(header[0]);
+        QCOMPARE(header.size(), length);
+        shortest = std::min(shortest, length);
+        longest = std::max(longest, length);
+    }
+    QCOMPARE(shortest, 32);
+    QCOMPARE(longest, 255);
+}
+
+void TestPasswordCipher::codePageRoundTripsEveryByte()
+{
+    QByteArray all;
+    for (int b = 0; b < 256; ++b)
+        all.append(char(b));
+    QCOMPARE(Windows1252::fromUnicode(Windows1252::toUnicode(all)), all);
+}
+
+void TestPasswordCipher::codePageMapsSpecialCharacters_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QByteArray>("bytes");
+    QTest::newRow("euro sign") << u"\u20AC5"_s << QByteArrayLiteral("\x80" "5");
+    QTest::newRow("e acute") << u"Caf\u00E9"_s << QByteArrayLiteral("Caf\xE9");
+    QTest::newRow("curly quotes") << u"\u201Cq\u201D"_s << QByteArrayLiteral("\x93q\x94");
+    QTest::newRow("outside the code page") << u"\u4E2D"_s << QByteArrayLiteral("?");
+    QTest::newRow("outside the basic plane") << u"a\U0001F600b"_s << QByteArrayLiteral("a?b");
+}
+
+void TestPasswordCipher::codePageMapsSpecialCharacters()
+{
+    QFETCH(QString, text);
+    QFETCH(QByteArray, bytes);
+    QCOMPARE(Windows1252::fromUnicode(text), bytes);
+}
+
+void TestPasswordCipher::armourBreaksLongLines()
+{
+    const QByteArray bytes(30, 'a'); // 40 characters of Base64
+    const QString text = Base64Armour::encode(bytes, 16);
+    QCOMPARE(text.split(u"\r\n"_s).first().size(), 16);
+    QCOMPARE(Base64Armour::decode(text), bytes);
+    // Below ten counts as ten: a break after every twelfth character.
+    QCOMPARE(Base64Armour::encode(bytes, 3).split(u"\r\n"_s).first().size(), 12);
+    QCOMPARE(Base64Armour::encode(QByteArrayLiteral("ab"), 9999), u"YWI="_s);
+    QCOMPARE(Base64Armour::decode(u"YWI="_s), QByteArrayLiteral("ab"));
+    QCOMPARE(Base64Armour::decode(u"YW="_s), QByteArray());
+}
+
+QTEST_GUILESS_MAIN(TestPasswordCipher)
+#include "tst_passwordcipher.moc"
