@@ -31,8 +31,8 @@ int main(int argc, char *argv[])
         prompter.message(problem, u" Veltrix"_s, Prompter::Icon::Exclamation);
         return 1;
     }
-    prompter.message(u"Settings loaded; the main database is at "_s
-                         + context.settings().mainDatabaseFile,
+    prompter.message(u"Settings loaded; the main database is at "_s +
+                         context.settings().mainDatabaseFile,
                      u" Veltrix"_s, Prompter::Icon::Information);
     return 0;
 }

@@ -17,8 +17,7 @@ int encryptPassword(const QStringList &arguments)
         return 2;
     }
     PasswordCipher cipher;
-    QTextStream(stdout) << cipher.encryptText(arguments.first(), Settings::PasswordKey)
-                        << Qt::endl;
+    QTextStream(stdout) << cipher.encryptText(arguments.first(), Settings::PasswordKey) << Qt::endl;
     return 0;
 }
 

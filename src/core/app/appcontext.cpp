@@ -9,7 +9,6 @@ AppContext::AppContext(std::unique_ptr<SettingsStore> store, Prompter &prompter,
     , m_prompter(prompter)
     , m_locations(std::move(locations))
     , m_clock(std::move(clock))
-{
-}
+{}
 
 AppContext::~AppContext() = default;

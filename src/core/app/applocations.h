@@ -10,8 +10,8 @@
 // installed data folder.
 struct AppLocations
 {
-    QString appFolder;                     // ends in a separator
-    QStringList newDatabaseCandidates;     // first existing one wins
+    QString appFolder;                 // ends in a separator
+    QStringList newDatabaseCandidates; // first existing one wins
 
     static AppLocations forThisMachine();
     // Everything in one folder, as on Windows; used by tests and the demo workspace.

@@ -13,7 +13,9 @@ public:
     // The database layer's general failure, almost always a lost network share or server.
     static constexpr qint32 CommunicationFailure = -2147467259;
 
-    explicit ErrorReporter(Prompter &prompter) : m_prompter(prompter) {}
+    explicit ErrorReporter(Prompter &prompter)
+        : m_prompter(prompter)
+    {}
 
     // Number 0 means no error and shows nothing.
     void reportError(qint32 number, const QString &description, const QString &context) const;

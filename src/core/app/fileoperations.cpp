@@ -124,8 +124,8 @@ bool writeTextFile(const QString &path, const QString &text, Prompter &prompter)
         if (file.write(bytes) == bytes.size() && file.commit())
             return true;
     }
-    const QString reason = file.errorString().isEmpty() ? u"Path/File access error"_s
-                                                        : file.errorString();
+    const QString reason =
+        file.errorString().isEmpty() ? u"Path/File access error"_s : file.errorString();
     ErrorReporter(prompter).reportError(PathFileAccessError, reason, u"WriteFile"_s);
     return false;
 }
@@ -160,8 +160,8 @@ namespace {
 int deleteFolderContentsAndFolder(const QString &folder)
 {
     // Without write and search permission on the folder its entries cannot be removed.
-    QFile::setPermissions(folder, QFile::permissions(folder) | QFileDevice::ReadOwner
-                                      | QFileDevice::WriteOwner | QFileDevice::ExeOwner);
+    QFile::setPermissions(folder, QFile::permissions(folder) | QFileDevice::ReadOwner |
+                                      QFileDevice::WriteOwner | QFileDevice::ExeOwner);
 
     const QDir dir(folder);
     const QFileInfoList entries = dir.entryInfoList(

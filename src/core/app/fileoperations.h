@@ -15,9 +15,9 @@ QString addTrailingSlash(const QString &path);
 
 struct FileCheck
 {
-    Prompter *warnTo = nullptr;   // shows "Missing File" when set and the file is missing
-    QString warningSuffix;        // appended to that message
-    bool create = false;          // creates a missing file empty (the answer stays false)
+    Prompter *warnTo = nullptr; // shows "Missing File" when set and the file is missing
+    QString warningSuffix;      // appended to that message
+    bool create = false;        // creates a missing file empty (the answer stays false)
 };
 
 // True when the path names an existing file (not a folder).

@@ -44,7 +44,9 @@ QString withoutCurrencySymbol(QString text, const QString &localSymbol)
 
 } // namespace
 
-NumberFormat::NumberFormat() : m_locale(userLocale()) {}
+NumberFormat::NumberFormat()
+    : m_locale(userLocale())
+{}
 
 QLocale NumberFormat::userLocale()
 {

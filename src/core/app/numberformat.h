@@ -13,7 +13,9 @@ public:
     // The user's locale; a bare C or POSIX locale (a server without regional settings)
     // stands for English (Australia).
     NumberFormat();
-    explicit NumberFormat(const QLocale &locale) : m_locale(locale) {}
+    explicit NumberFormat(const QLocale &locale)
+        : m_locale(locale)
+    {}
 
     static QLocale userLocale();
     const QLocale &locale() const { return m_locale; }

@@ -33,7 +33,11 @@ public:
 class BusyPointer
 {
 public:
-    explicit BusyPointer(Prompter &prompter) : m_prompter(prompter) { m_prompter.setBusyPointer(); }
+    explicit BusyPointer(Prompter &prompter)
+        : m_prompter(prompter)
+    {
+        m_prompter.setBusyPointer();
+    }
     ~BusyPointer() { m_prompter.setNormalPointer(); }
     BusyPointer(const BusyPointer &) = delete;
     BusyPointer &operator=(const BusyPointer &) = delete;

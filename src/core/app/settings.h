@@ -19,11 +19,11 @@ struct Settings
     QString tempBmpFile;
     QString mainDatabaseFile;
 
-    QString accPackage;    // "MYOB" or "MoneyWorks"
+    QString accPackage; // "MYOB" or "MoneyWorks"
     QString accFilePath;
     QString accFileDriver;
     QString accFileUser;
-    QString accFilePass;   // deciphered
+    QString accFilePass; // deciphered
 
     qint16 scrollBarHeight = 16;
     qint32 currentYear = 0;

@@ -2,10 +2,10 @@
 #include "settingsloader.h"
 
 #include "appcontext.h"
+#include "cipher/passwordcipher.h"
 #include "fileoperations.h"
 #include "prompter.h"
 #include "settingsstore.h"
-#include "cipher/passwordcipher.h"
 
 #include <QDir>
 #include <QFile>
@@ -54,23 +54,24 @@ QString loadSettings(AppContext &context)
     settings.accFileDriver = store.readSetting(u"AccFileDriver"_s);
     settings.accFileUser = store.readSetting(u"AccFileUser"_s);
     const QString storedPassword = store.readSetting(u"AccFilePass"_s);
-    settings.accFilePass = storedPassword.isEmpty()
-                               ? QString()
-                               : PasswordCipher().decryptText(storedPassword, Settings::PasswordKey);
+    settings.accFilePass =
+        storedPassword.isEmpty()
+            ? QString()
+            : PasswordCipher().decryptText(storedPassword, Settings::PasswordKey);
 
     if (const QString problem = checkSettings(dbPath, settings); !problem.isEmpty())
         return problem;
 
     settings.mainDatabaseFile = FileOperations::addTrailingSlash(dbPath) + u"main.db"_s;
-    if (!FileOperations::fileExists(settings.mainDatabaseFile)
-        && FileOperations::fileExists(settings.newDatabaseFile)
-        && FileOperations::copyFile(settings.newDatabaseFile, settings.mainDatabaseFile, false)) {
+    if (!FileOperations::fileExists(settings.mainDatabaseFile) &&
+        FileOperations::fileExists(settings.newDatabaseFile) &&
+        FileOperations::copyFile(settings.newDatabaseFile, settings.mainDatabaseFile, false)) {
         // An installed template is read-only; the database made from it must not be.
         QFile::setPermissions(settings.mainDatabaseFile,
-                              QFile::permissions(settings.mainDatabaseFile)
-                                  | QFileDevice::WriteOwner);
-        context.prompter().message(u"A new database file has been created!"_s,
-                                   u"New Database"_s, Prompter::Icon::Information);
+                              QFile::permissions(settings.mainDatabaseFile) |
+                                  QFileDevice::WriteOwner);
+        context.prompter().message(u"A new database file has been created!"_s, u"New Database"_s,
+                                   Prompter::Icon::Information);
     }
 
     if (!FileOperations::fileExists(settings.mainDatabaseFile))

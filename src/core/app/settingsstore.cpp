@@ -27,13 +27,11 @@ SettingsStore::SettingsStore()
     : m_settings(std::make_unique<QSettings>(QSettings::NativeFormat, QSettings::UserScope,
                                              u"Veltrix"_s, u"veltrix"_s))
 #endif
-{
-}
+{}
 
 SettingsStore::SettingsStore(const QString &iniFile)
     : m_settings(std::make_unique<QSettings>(iniFile, QSettings::IniFormat))
-{
-}
+{}
 
 SettingsStore::~SettingsStore() = default;
 
@@ -60,8 +58,7 @@ QString SettingsStore::readSetting(const QString &valueName, const QString &key,
     return text.isEmpty() ? defaultValue : text;
 }
 
-void SettingsStore::writeSetting(const QString &valueName, const QString &value,
-                                 const QString &key)
+void SettingsStore::writeSetting(const QString &valueName, const QString &value, const QString &key)
 {
     m_settings->setValue(settingPath(valueName, key), value);
     m_settings->sync();

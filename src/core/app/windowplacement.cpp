@@ -21,8 +21,7 @@ std::optional<int> wholeNumber(const QString &text)
 WindowPlacement::WindowPlacement(SettingsStore &store, double twipsPerPixel)
     : m_store(store)
     , m_twipsPerPixel(twipsPerPixel > 0 ? twipsPerPixel : 15.0)
-{
-}
+{}
 
 double WindowPlacement::twipsPerPixelAt(double dotsPerInch)
 {
@@ -68,8 +67,7 @@ std::optional<WindowPlacement::State> WindowPlacement::savedState(const QString 
     return std::nullopt;
 }
 
-std::optional<int> WindowPlacement::readPixels(const QString &windowName,
-                                               const QString &item) const
+std::optional<int> WindowPlacement::readPixels(const QString &windowName, const QString &item) const
 {
     const auto twips = wholeNumber(m_store.readSetting(windowName + item, SettingsStore::FormsKey));
     if (!twips)

@@ -40,7 +40,10 @@ private:
 class BitReader
 {
 public:
-    BitReader(const char *data, qsizetype size) : m_data(data), m_bitCount(size * 8) {}
+    BitReader(const char *data, qsizetype size)
+        : m_data(data)
+        , m_bitCount(size * 8)
+    {}
     bool atEnd() const { return m_position >= m_bitCount; }
     qsizetype remaining() const { return m_bitCount - m_position; }
     bool next()
@@ -62,7 +65,7 @@ std::array<Code, 256> buildCodes(const std::array<quint64, 256> &frequencies)
     struct Node
     {
         quint64 weight;
-        int symbol;    // -1 for an inner node
+        int symbol; // -1 for an inner node
         int children[2];
     };
     std::vector<Node> nodes;
@@ -113,7 +116,9 @@ QByteArray storedContainer(const QByteArray &bytes)
 class DecodingTree
 {
 public:
-    DecodingTree() : m_nodes(1) {}
+    DecodingTree()
+        : m_nodes(1)
+    {}
 
     bool insert(const Code &code, quint8 symbol)
     {

@@ -11,9 +11,9 @@ class HuffmanCodec
 public:
     enum class Status {
         Ok,
-        ChecksumMismatch,   // decoded, but the check byte disagrees: the bytes are suspect
-        NotIdentified,      // neither "HE0" nor "HE3"
-        Corrupt,            // the table or the data cannot be decoded
+        ChecksumMismatch, // decoded, but the check byte disagrees: the bytes are suspect
+        NotIdentified,    // neither "HE0" nor "HE3"
+        Corrupt,          // the table or the data cannot be decoded
     };
 
     struct Decoded

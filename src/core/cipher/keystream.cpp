@@ -28,8 +28,7 @@ std::array<quint8, M> fold(const std::array<quint16, N> &table)
 
 } // namespace
 
-template<std::size_t N>
-quint8 KeyStream::Permutation<N>::step(quint8 input)
+template<std::size_t N> quint8 KeyStream::Permutation<N>::step(quint8 input)
 {
     i = (i + 1) % N;
     j = (table[i] + j + input) % N;

@@ -21,8 +21,7 @@ public:
     QByteArray decipher(const QByteArray &cipher);
 
 private:
-    template<std::size_t N>
-    struct Permutation
+    template<std::size_t N> struct Permutation
     {
         std::array<quint16, N> table{};
         std::size_t i = 0;

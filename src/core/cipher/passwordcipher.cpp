@@ -34,8 +34,7 @@ QString trimmedOfBlanks(const QString &text)
 
 PasswordCipher::PasswordCipher(QRandomGenerator *random)
     : m_random(random ? random : QRandomGenerator::system())
-{
-}
+{}
 
 QString PasswordCipher::encryptText(const QString &text, const QString &key,
                                     const QString &secondKey)
@@ -81,8 +80,8 @@ std::optional<QByteArray> PasswordCipher::decode(const QString &armoured, const 
 
     const qsizetype size = framed.size();
     const int headerSize = size > 0 ? static_cast<quint8>(framed[0]) : 0;
-    if (size == 0 || headerSize < 2 || headerSize > size - FooterSize
-        || framed[size - 2] != framed[headerSize - 2] || framed[size - 1] != framed[headerSize - 1]) {
+    if (size == 0 || headerSize < 2 || headerSize > size - FooterSize ||
+        framed[size - 2] != framed[headerSize - 2] || framed[size - 1] != framed[headerSize - 1]) {
         setError(TextDecodingFailed);
         return std::nullopt;
     }
@@ -124,23 +123,40 @@ bool PasswordCipher::keyIsUsable(const QString &key)
 std::optional<QString> PasswordCipher::cryptoErrorText(int number, const QString &fileErrorText)
 {
     switch (number) {
-    case 0: return QString();
-    case 1: return u"Cannot continue without text (Error 1)"_s;
-    case 2: return u"Cannot continue without key (Error 2)"_s;
-    case 3: return u"Key too small/is repeating (Error 3)"_s;
-    case 4: return u"Source file not found (Error 4)"_s;
-    case 5: return u"Compression checksum error (Error 5)"_s;
-    case 6: return u"Cannot process empty file (Error 6)"_s;
-    case 10: return u"Crypto version unknown/contains errors (Error 10)"_s;
-    case 11: return u"Encoding has been aborted by user"_s;
-    case 12: return u"File error: "_s + fileErrorText + u" (Error 12)"_s;
-    case 20: return u"Crypto file version unknown/contains errors (Error 20)"_s;
-    case 21: return u"Decoding has been aborted by user"_s;
-    case 22: return u"File error: "_s + fileErrorText + u" (Error 22)"_s;
-    case 23: return u"Failed decoding the file (Error 23)"_s;
-    case 30: return u"Crypto header or footer format incomplete/contains errors (Error 30)"_s;
-    case 33: return u"Failed decoding the text (Error 33)"_s;
-    default: return std::nullopt;
+    case 0:
+        return QString();
+    case 1:
+        return u"Cannot continue without text (Error 1)"_s;
+    case 2:
+        return u"Cannot continue without key (Error 2)"_s;
+    case 3:
+        return u"Key too small/is repeating (Error 3)"_s;
+    case 4:
+        return u"Source file not found (Error 4)"_s;
+    case 5:
+        return u"Compression checksum error (Error 5)"_s;
+    case 6:
+        return u"Cannot process empty file (Error 6)"_s;
+    case 10:
+        return u"Crypto version unknown/contains errors (Error 10)"_s;
+    case 11:
+        return u"Encoding has been aborted by user"_s;
+    case 12:
+        return u"File error: "_s + fileErrorText + u" (Error 12)"_s;
+    case 20:
+        return u"Crypto file version unknown/contains errors (Error 20)"_s;
+    case 21:
+        return u"Decoding has been aborted by user"_s;
+    case 22:
+        return u"File error: "_s + fileErrorText + u" (Error 22)"_s;
+    case 23:
+        return u"Failed decoding the file (Error 23)"_s;
+    case 30:
+        return u"Crypto header or footer format incomplete/contains errors (Error 30)"_s;
+    case 33:
+        return u"Failed decoding the text (Error 33)"_s;
+    default:
+        return std::nullopt;
     }
 }
 

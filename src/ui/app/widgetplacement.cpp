@@ -37,7 +37,8 @@ void restoreWindowPlacement(QWidget &window, SettingsStore &store, bool skipStat
         placement.restore(window.objectName(), QRect(window.pos(), window.size()));
     window.move(restored.topLeft());
     window.resize(restored.size());
-    if (!skipState && placement.savedState(window.objectName()) == WindowPlacement::State::Maximised)
+    if (!skipState &&
+        placement.savedState(window.objectName()) == WindowPlacement::State::Maximised)
         window.setWindowState(window.windowState() | Qt::WindowMaximized);
 }
 

@@ -1,4 +1,73 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "app/errorreporter.h"
+#include "app/recordingprompter.h"
+
 #include <QTest>
-class T : public QObject { Q_OBJECT };
-QTEST_MAIN(T)
+
+using namespace Qt::StringLiterals;
+
+class TestErrorReporter : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void reports_data();
+    void reports();
+    void noErrorShowsNothing();
+};
+
+void TestErrorReporter::reports_data()
+{
+    QTest::addColumn<int>("number");
+    QTest::addColumn<QString>("description");
+    QTest::addColumn<QString>("context");
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QString>("title");
+
+    const QString communication = u"Could not communicate with database. Check the network "
+                                  u"connection and ensure the database server is switched on."_s;
+    QTest::newRow("database unreachable")
+        << -2147467259 << u"Disk or network error."_s << u"Connection"_s << communication
+        << u"Communication Error"_s;
+    QTest::newRow("database unreachable, no description")
+        << -2147467259 << QString() << u"Find Record"_s << communication
+        << u"Communication Error"_s;
+    QTest::newRow("ordinary error")
+        << 3021 << u"No current record."_s << u"Find Record"_s
+        << u"Error 3021\r\n\r\nNo current record."_s << u"Find Record Error 3021"_s;
+    QTest::newRow("negative number keeps its sign")
+        << -2147217900 << u"Syntax error."_s << u"Produce"_s
+        << u"Error -2147217900\r\n\r\nSyntax error."_s << u"Produce Error -2147217900"_s;
+}
+
+void TestErrorReporter::reports()
+{
+    QFETCH(int, number);
+    QFETCH(QString, description);
+    QFETCH(QString, context);
+    QFETCH(QString, text);
+    QFETCH(QString, title);
+
+    RecordingPrompter prompter;
+    prompter.setBusyPointer();
+    ErrorReporter(prompter).reportError(number, description, context);
+    QCOMPARE(prompter.messages().size(), 1);
+    QCOMPARE(prompter.messages().first().text, text);
+    QCOMPARE(prompter.messages().first().title, title);
+    QCOMPARE(prompter.messages().first().icon, Prompter::Icon::Exclamation);
+    QCOMPARE(prompter.messages().first().buttons, Prompter::Buttons::Ok);
+    // The user is not left looking at an hourglass while reading.
+    QVERIFY(!prompter.isBusy());
+}
+
+void TestErrorReporter::noErrorShowsNothing()
+{
+    RecordingPrompter prompter;
+    prompter.setBusyPointer();
+    ErrorReporter(prompter).reportError(0, u"ignored"_s, u"Logoff"_s);
+    QVERIFY(prompter.messages().isEmpty());
+    QVERIFY(prompter.isBusy());
+}
+
+QTEST_GUILESS_MAIN(TestErrorReporter)
 #include "tst_errorreporter.moc"

@@ -62,7 +62,8 @@ void TestCipherFuzz::mutatedStoredValues()
         switch (random.bounded(3)) {
         case 0:
             for (int flips = 1 + int(random.bounded(3)); flips > 0; --flips)
-                stored[random.bounded(stored.size())] = QChar(char16_t(0x2B + random.bounded(0x50)));
+                stored[random.bounded(stored.size())] =
+                    QChar(char16_t(0x2B + random.bounded(0x50)));
             break;
         case 1:
             stored.truncate(random.bounded(stored.size()));

@@ -100,7 +100,11 @@ void TestHuffmanCodec::writesTheDocumentedLayout()
     QCOMPARE(quint8(container[4]), quint8('a' ^ 'a' ^ 'a' ^ 'a' ^ 'b' ^ 'b' ^ 'c' ^ 'd'));
     QCOMPARE(qFromLittleEndian<quint32>(container.constData() + 5), quint32(8));
     QCOMPARE(qFromLittleEndian<quint16>(container.constData() + 9), quint16(4));
-    QCOMPARE(container.mid(11, 8), QByteArray("a\x01" "b\x02" "c\x03" "d\x03", 8));
+    QCOMPARE(container.mid(11, 8), QByteArray("a\x01"
+                                              "b\x02"
+                                              "c\x03"
+                                              "d\x03",
+                                              8));
     // 9 bits of codes take two bytes; 4 + 4 + 3 + 3 = 14 bits of data take two more.
     QCOMPARE(container.size(), 11 + 8 + 2 + 2);
     // The last byte of the table has its unused high bits clear.
@@ -119,13 +123,15 @@ void TestHuffmanCodec::decodesCodesItDidNotChoose_data()
 {
     QTest::addColumn<QByteArray>("plain");
     QTest::addColumn<QByteArray>("container");
-    QTest::newRow("ones first")
-        << QByteArray("secrete!")
-        << codedContainer("secrete!", {{'e', "1"}, {'c', "011"}, {'r', "010"}, {'t', "001"},
-                                       {'s', "0001"}, {'!', "0000"}});
+    QTest::newRow("ones first") << QByteArray("secrete!")
+                                << codedContainer("secrete!", {{'e', "1"},
+                                                               {'c', "011"},
+                                                               {'r', "010"},
+                                                               {'t', "001"},
+                                                               {'s', "0001"},
+                                                               {'!', "0000"}});
     QTest::newRow("lengths beyond need")
-        << QByteArray("abcab")
-        << codedContainer("abcab", {{'a', "0"}, {'b', "10"}, {'c', "1110"}});
+        << QByteArray("abcab") << codedContainer("abcab", {{'a', "0"}, {'b', "10"}, {'c', "1110"}});
     QTest::newRow("no data") << QByteArray() << codedContainer({}, {});
 }
 

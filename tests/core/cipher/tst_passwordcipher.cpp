@@ -162,12 +162,13 @@ void TestPasswordCipher::keyStreamMatchesItsDefinition()
 
 void TestPasswordCipher::secondKeyChangesTheStream()
 {
-    const QByteArray framed = fixedHeader() + QByteArrayLiteral("HE0\rCaf\xe9")
-                              + fixedHeader().right(2);
+    const QByteArray framed =
+        fixedHeader() + QByteArrayLiteral("HE0\rCaf\xe9") + fixedHeader().right(2);
     const QByteArray written = Base64Armour::decode(
         u"Wr5iG7jhzZ20m5NE9yaHsw/6zAJ2DSlGITuWhtiK60MFUPjBfgQxD2MrMF0F4CMDGps="_s);
-    QCOMPARE(KeyStream(QByteArrayLiteral("Rv5HnW2j"), QByteArrayLiteral("Second")).decipher(written),
-             framed);
+    QCOMPARE(
+        KeyStream(QByteArrayLiteral("Rv5HnW2j"), QByteArrayLiteral("Second")).decipher(written),
+        framed);
     QVERIFY(KeyStream(QByteArrayLiteral("Rv5HnW2j"), {}).decipher(written) != framed);
 }
 
@@ -276,8 +277,8 @@ void TestPasswordCipher::errorMessages_data()
     QTest::newRow("21") << 21 << u"Decoding has been aborted by user"_s;
     QTest::newRow("22") << 22 << u"File error: Disk full (Error 22)"_s;
     QTest::newRow("23") << 23 << u"Failed decoding the file (Error 23)"_s;
-    QTest::newRow("30") << 30
-                        << u"Crypto header or footer format incomplete/contains errors (Error 30)"_s;
+    QTest::newRow("30")
+        << 30 << u"Crypto header or footer format incomplete/contains errors (Error 30)"_s;
     QTest::newRow("33") << 33 << u"Failed decoding the text (Error 33)"_s;
 }
 
@@ -322,7 +323,9 @@ void TestPasswordCipher::codePageMapsSpecialCharacters_data()
 {
     QTest::addColumn<QString>("text");
     QTest::addColumn<QByteArray>("bytes");
-    QTest::newRow("euro sign") << u"\u20AC5"_s << QByteArrayLiteral("\x80" "5");
+    QTest::newRow("euro sign") << u"\u20AC5"_s
+                               << QByteArrayLiteral("\x80"
+                                                    "5");
     QTest::newRow("e acute") << u"Caf\u00E9"_s << QByteArrayLiteral("Caf\xE9");
     QTest::newRow("curly quotes") << u"\u201Cq\u201D"_s << QByteArrayLiteral("\x93q\x94");
     QTest::newRow("outside the code page") << u"\u4E2D"_s << QByteArrayLiteral("?");
