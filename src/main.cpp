@@ -1,9 +1,11 @@
 // Veltrix — KPI dashboard for small businesses.
 
 #include "app/appcontext.h"
+#include "app/loadingwindow.h"
+#include "app/prompter.h"
 #include "app/qtprompter.h"
-#include "app/settingsloader.h"
 #include "app/settingsstore.h"
+#include "app/shutdown.h"
 
 #include <QApplication>
 #include <QStyle>
@@ -22,17 +24,20 @@ int main(int argc, char *argv[])
     context.setPlatformScrollBarHeight(
         QApplication::style()->pixelMetric(QStyle::PM_ScrollBarExtent));
 
-    // Start-up goes as far as the settings for now: a problem with them is shown and ends
-    // the run, as nothing after the settings can work without them.
-    prompter.setBusyPointer();
-    const QString problem = loadSettings(context);
-    prompter.setNormalPointer();
-    if (!problem.isEmpty()) {
-        prompter.message(problem, u" Veltrix"_s, Prompter::Icon::Exclamation);
-        return 1;
-    }
-    prompter.message(u"Settings loaded; the main database is at "_s +
-                         context.settings().mainDatabaseFile,
-                     u" Veltrix"_s, Prompter::Icon::Information);
-    return 0;
+    auto *loading = new LoadingWindow(context, prompter);
+    loading->setAttribute(Qt::WA_DeleteOnClose);
+    QObject::connect(loading, &LoadingWindow::startupSucceeded, &app, [&] {
+        // The main window is not part of this build yet: say where start-up got to, then end
+        // the run in order.
+        prompter.message(u"Start-up is complete: the database at "_s
+                             + context.settings().mainDatabaseFile
+                             + u" is connected (database version "_s
+                             + context.mainDatabase().databaseVersion() + u")."_s,
+                         u" Veltrix"_s, Prompter::Icon::Information);
+        shutDown(context);
+        QApplication::quit();
+    });
+    loading->show();
+    loading->startLoading();
+    return QApplication::exec();
 }

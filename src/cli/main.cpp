@@ -1,6 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 // veltrix-cli: the program's core without windows, for scripts, provisioning and tests.
 
+#include "databaseverbs.h"
 #include "passwordverbs.h"
 
 #include <QCoreApplication>
@@ -27,6 +28,8 @@ const QList<Verb> &verbs()
          PasswordVerbs::encryptPassword},
         {u"decrypt-password"_s, u"STORED"_s, u"print the password a stored value holds"_s,
          PasswordVerbs::decryptPassword},
+        {u"create-database"_s, u"SCRIPT OUTPUT"_s, u"make a database file from a SQL script"_s,
+         DatabaseVerbs::createDatabase},
     };
     return all;
 }

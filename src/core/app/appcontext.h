@@ -6,8 +6,14 @@
 #include "numberformat.h"
 #include "settings.h"
 
+#include "database/maindatabase.h"
+#include "engine/perioddataset.h"
+#include "users/loginstate.h"
+#include "web/webpageopener.h"
+
 #include <memory>
 
+class AccountingSource;
 class Prompter;
 class SettingsStore;
 
@@ -32,6 +38,16 @@ public:
     Settings &settings() { return m_settings; }
     const Settings &settings() const { return m_settings; }
 
+    MainDatabase &mainDatabase() { return m_mainDatabase; }
+    PeriodDataSet &periodDataSet() { return m_periodDataSet; }
+    const PeriodDataSet &periodDataSet() const { return m_periodDataSet; }
+    LoginState &loginState() { return m_loginState; }
+    WebPageOpener &webPageOpener() { return m_webPageOpener; }
+
+    // The accounting package in use, once one has been reached; may be null.
+    AccountingSource *accountingSource() const { return m_accountingSource.get(); }
+    void setAccountingSource(std::unique_ptr<AccountingSource> source);
+
     // The height of a horizontal scroll bar on this desktop; the windows set it, since only
     // they know the style in use.
     void setPlatformScrollBarHeight(int pixels) { m_platformScrollBarHeight = pixels; }
@@ -44,5 +60,10 @@ private:
     Clock m_clock;
     NumberFormat m_numberFormat;
     Settings m_settings;
+    MainDatabase m_mainDatabase;
+    PeriodDataSet m_periodDataSet{m_numberFormat};
+    LoginState m_loginState;
+    WebPageOpener m_webPageOpener;
+    std::unique_ptr<AccountingSource> m_accountingSource;
     int m_platformScrollBarHeight = 16;
 };

@@ -1,0 +1,25 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "shutdown.h"
+
+#include "appcontext.h"
+#include "fileoperations.h"
+
+#include "database/mainconnector.h"
+#include "engine/cachefile.h"
+#include "web/webpageopener.h"
+
+void shutDown(AppContext &context, const std::function<void()> &logOffCurrentUser)
+{
+    const PeriodDataSet::Slot &slot0 = context.periodDataSet().slot(0);
+    if (!slot0.isEmpty() && !context.settings().cacheFile.isEmpty())
+        CacheFile::write(context.settings().cacheFile, slot0);
+
+    if (context.loginState().loggedIn && logOffCurrentUser)
+        logOffCurrentUser();
+
+    context.webPageOpener().closeWindow();
+    disconnectMainDatabase(context);
+
+    if (!context.settings().tempFolder.isEmpty())
+        FileOperations::clearFolder(context.settings().tempFolder);
+}

@@ -1,0 +1,48 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "maindatabase.h"
+
+using namespace Qt::StringLiterals;
+
+std::optional<DbError> MainDatabase::openStandingRecordsets()
+{
+    const QSqlDatabase db = database();
+    m_config = RecordSet(db, u"SELECT * FROM Config"_s);
+    m_users = RecordSet(db, u"SELECT * FROM Users"_s);
+    m_hours = RecordSet(db, u"SELECT * FROM Hours"_s);
+    m_fields = RecordSet(db, u"SELECT * FROM Fields WHERE Hide<>1 ORDER BY `Order`"_s);
+    for (RecordSet *recordset : {&m_config, &m_users, &m_hours, &m_fields}) {
+        if (const auto error = recordset->open())
+            return error;
+    }
+    return std::nullopt;
+}
+
+std::optional<DbError> MainDatabase::openTabRecordsets()
+{
+    for (int tab = 1; tab <= TabCount; ++tab) {
+        RecordSet &recordset = m_tabs.at(tab - 1);
+        recordset = RecordSet(database(),
+                              u"SELECT * FROM Fields WHERE Tab="_s + QString::number(tab)
+                                  + u" AND `Hide`<>1 ORDER BY `Order`"_s,
+                              RecordSet::Access::ReadOnly);
+        if (const auto error = recordset.open())
+            return error;
+    }
+    return std::nullopt;
+}
+
+void MainDatabase::requeryFields()
+{
+    m_fields.requery();
+    for (RecordSet &tab : m_tabs)
+        tab.requery();
+}
+
+void MainDatabase::close()
+{
+    for (RecordSet *recordset : {&m_config, &m_users, &m_hours, &m_fields})
+        recordset->close();
+    for (RecordSet &tab : m_tabs)
+        tab.close();
+    m_connection.close();
+}

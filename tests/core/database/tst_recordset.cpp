@@ -1,0 +1,226 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "database/recordset.h"
+#include "database/sqliteconnection.h"
+
+#include <QFile>
+#include <QSqlQuery>
+#include <QTemporaryDir>
+#include <QTest>
+
+using namespace Qt::StringLiterals;
+
+class TestRecordSet : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void init();
+    void cleanup();
+    void walksAndReadsByAnyCase();
+    void emptyRecordSetIsBeforeAndPastEnd();
+    void findsIdForwardFromCurrent();
+    void addsUpdatesAndDeletes();
+    void updateOfAChangedRowFails();
+    void updateOfADeletedRowFails();
+    void changesToOtherColumnsDoNotConflict();
+    void readOnlyAndJoinedQueriesRefuseChanges();
+    void bindingsKeepQuotesAsText();
+    void openFailures_data();
+    void openFailures();
+
+private:
+    QString databaseFile() const { return m_dir->filePath(u"main.db"_s); }
+
+    std::unique_ptr<QTemporaryDir> m_dir;
+    std::unique_ptr<SqliteConnection> m_first;
+    std::unique_ptr<SqliteConnection> m_second;
+};
+
+void TestRecordSet::init()
+{
+    m_dir = std::make_unique<QTemporaryDir>();
+    QVERIFY(QFile::copy(QStringLiteral(VELTRIX_NEW_DB), databaseFile()));
+    QFile::setPermissions(databaseFile(), QFileDevice::ReadOwner | QFileDevice::WriteOwner);
+    m_first = std::make_unique<SqliteConnection>();
+    m_second = std::make_unique<SqliteConnection>();
+    QCOMPARE(m_first->open(databaseFile()), std::nullopt);
+    QCOMPARE(m_second->open(databaseFile()), std::nullopt);
+}
+
+void TestRecordSet::cleanup()
+{
+    m_first.reset();
+    m_second.reset();
+    m_dir.reset();
+}
+
+void TestRecordSet::walksAndReadsByAnyCase()
+{
+    RecordSet hours(m_first->database(), u"SELECT * FROM Hours ORDER BY ID"_s);
+    QCOMPARE(hours.open(), std::nullopt);
+    QCOMPARE(hours.recordCount(), 2);
+    QVERIFY(!hours.bof());
+    QCOMPARE(hours.value(u"department"_s).toString(), u"Panel"_s);
+    QCOMPARE(hours.value(u"DEPARTMENT"_s).toString(), u"Panel"_s);
+    QCOMPARE(hours.moveNext(), std::nullopt);
+    QCOMPARE(hours.value(u"Department"_s).toString(), u"Paint"_s);
+    QCOMPARE(hours.moveNext(), std::nullopt);
+    QVERIFY(hours.eof());
+    QVERIFY(!hours.value(u"Department"_s).isValid());
+    QCOMPARE(hours.moveNext()->number, DbError::NoCurrentRecord);
+    QVERIFY(!hours.value(u"NoSuchColumn"_s).isValid());
+}
+
+void TestRecordSet::emptyRecordSetIsBeforeAndPastEnd()
+{
+    RecordSet users(m_first->database(), u"SELECT * FROM Users"_s);
+    QCOMPARE(users.open(), std::nullopt);
+    QVERIFY(users.bof());
+    QVERIFY(users.eof());
+    QCOMPARE(users.moveFirst()->number, DbError::NoCurrentRecord);
+
+    RecordSet closed;
+    QVERIFY(!closed.isOpen());
+    QCOMPARE(closed.moveFirst()->number, DbError::RecordsetClosed);
+}
+
+void TestRecordSet::findsIdForwardFromCurrent()
+{
+    RecordSet fields(m_first->database(), u"SELECT * FROM Fields WHERE Hide<>1 ORDER BY `Order`"_s);
+    QCOMPARE(fields.open(), std::nullopt);
+    QCOMPARE(fields.findId(79), std::nullopt);
+    QCOMPARE(fields.value(u"ID"_s).toInt(), 79);
+    QCOMPARE(fields.value(u"Label"_s).toString(), u"Total sales"_s);
+    // Field 1 comes before 79 in this order: forward from here there is none.
+    QCOMPARE(fields.findId(1), std::nullopt);
+    QVERIFY(fields.eof());
+    QCOMPARE(fields.moveFirst(), std::nullopt);
+    QCOMPARE(fields.findId(1), std::nullopt);
+    QCOMPARE(fields.value(u"ID"_s).toInt(), 1);
+}
+
+void TestRecordSet::addsUpdatesAndDeletes()
+{
+    RecordSet users(m_first->database(), u"SELECT * FROM Users"_s);
+    QCOMPARE(users.open(), std::nullopt);
+    QCOMPARE(users.addNew(), std::nullopt);
+    QCOMPARE(users.setValue(u"username"_s, u"Bob"_s), std::nullopt);
+    QCOMPARE(users.setValue(u"Password"_s, u"pw"_s), std::nullopt);
+    QCOMPARE(users.update(), std::nullopt);
+    const qint64 id = users.value(u"ID"_s).toLongLong();
+    QVERIFY(id > 0);
+    QCOMPARE(users.value(u"Fields"_s).toString(), u"#"_s); // the table's default came back
+
+    RecordSet other(m_second->database(), u"SELECT * FROM Users"_s);
+    QCOMPARE(other.open(), std::nullopt);
+    QCOMPARE(other.recordCount(), 1);
+    QCOMPARE(other.value(u"UserName"_s).toString(), u"Bob"_s);
+
+    QCOMPARE(users.setValue(u"Password"_s, u"secret"_s), std::nullopt);
+    QCOMPARE(users.update(), std::nullopt);
+    QCOMPARE(other.requery(), std::nullopt);
+    QCOMPARE(other.value(u"Password"_s).toString(), u"secret"_s);
+
+    QCOMPARE(users.deleteCurrent(), std::nullopt);
+    QCOMPARE(other.requery(), std::nullopt);
+    QCOMPARE(other.recordCount(), 0);
+}
+
+void TestRecordSet::updateOfAChangedRowFails()
+{
+    RecordSet mine(m_first->database(), u"SELECT * FROM Config"_s);
+    RecordSet theirs(m_second->database(), u"SELECT * FROM Config"_s);
+    QCOMPARE(mine.open(), std::nullopt);
+    QCOMPARE(theirs.open(), std::nullopt);
+    QCOMPARE(mine.findId(4), std::nullopt);
+    QCOMPARE(theirs.findId(4), std::nullopt);
+
+    QCOMPARE(theirs.setValue(u"Value"_s, u"3"_s), std::nullopt);
+    QCOMPARE(theirs.update(), std::nullopt);
+
+    QCOMPARE(mine.setValue(u"Value"_s, u"1"_s), std::nullopt);
+    const std::optional<DbError> conflict = mine.update();
+    QVERIFY(conflict);
+    QCOMPARE(conflict->number, DbError::RowNotFound);
+
+    // The other copy's value stands; after a requery this copy sees it and may write again.
+    QCOMPARE(mine.requery(), std::nullopt);
+    QCOMPARE(mine.findId(4), std::nullopt);
+    QCOMPARE(mine.value(u"Value"_s).toString(), u"3"_s);
+    QCOMPARE(mine.setValue(u"Value"_s, u"4"_s), std::nullopt);
+    QCOMPARE(mine.update(), std::nullopt);
+}
+
+void TestRecordSet::updateOfADeletedRowFails()
+{
+    RecordSet mine(m_first->database(), u"SELECT * FROM Hours"_s);
+    QCOMPARE(mine.open(), std::nullopt);
+    QCOMPARE(mine.findId(2), std::nullopt);
+    QSqlQuery(m_second->database()).exec(u"DELETE FROM Hours WHERE ID = 2"_s);
+
+    QCOMPARE(mine.setValue(u"Value"_s, 120.0), std::nullopt);
+    QCOMPARE(mine.update()->number, DbError::RowNotFound);
+    QCOMPARE(mine.deleteCurrent()->number, DbError::RowNotFound);
+}
+
+void TestRecordSet::changesToOtherColumnsDoNotConflict()
+{
+    RecordSet mine(m_first->database(), u"SELECT * FROM Hours"_s);
+    RecordSet theirs(m_second->database(), u"SELECT * FROM Hours"_s);
+    QCOMPARE(mine.open(), std::nullopt);
+    QCOMPARE(theirs.open(), std::nullopt);
+    QCOMPARE(mine.findId(1), std::nullopt);
+    QCOMPARE(theirs.findId(1), std::nullopt);
+    QCOMPARE(theirs.setValue(u"Department"_s, u"Panel shop"_s), std::nullopt);
+    QCOMPARE(theirs.update(), std::nullopt);
+    QCOMPARE(mine.setValue(u"Value"_s, 95.5), std::nullopt);
+    QCOMPARE(mine.update(), std::nullopt);
+
+    QCOMPARE(theirs.requery(), std::nullopt);
+    QCOMPARE(theirs.findId(1), std::nullopt);
+    QCOMPARE(theirs.value(u"Department"_s).toString(), u"Panel shop"_s);
+    QCOMPARE(theirs.value(u"Value"_s).toDouble(), 95.5);
+}
+
+void TestRecordSet::readOnlyAndJoinedQueriesRefuseChanges()
+{
+    RecordSet readOnly(m_first->database(), u"SELECT * FROM Hours"_s, RecordSet::Access::ReadOnly);
+    QCOMPARE(readOnly.open(), std::nullopt);
+    QVERIFY(readOnly.setValue(u"Value"_s, 1).has_value());
+
+    RecordSet joined(m_first->database(),
+                     u"SELECT h.ID, h.Value, c.Value AS c FROM Hours h, Config c"_s);
+    QCOMPARE(joined.open(), std::nullopt);
+    QVERIFY(joined.setValue(u"Value"_s, 1).has_value());
+}
+
+void TestRecordSet::bindingsKeepQuotesAsText()
+{
+    QSqlQuery(m_first->database())
+        .exec(u"INSERT INTO Users (UserName, Password) VALUES ('O''Brien', 'x')"_s);
+    RecordSet users(m_first->database(), u"SELECT * FROM Users WHERE UserName = ?"_s,
+                    RecordSet::Access::Optimistic, {u"O'Brien"_s});
+    QCOMPARE(users.open(), std::nullopt);
+    QCOMPARE(users.recordCount(), 1);
+}
+
+void TestRecordSet::openFailures_data()
+{
+    QTest::addColumn<QString>("sql");
+    QTest::newRow("missing table") << u"SELECT * FROM Nowhere"_s;
+    QTest::newRow("bad SQL") << u"SELEC * FROM Config"_s;
+    QTest::newRow("missing column") << u"SELECT Nothing FROM Config"_s;
+}
+
+void TestRecordSet::openFailures()
+{
+    QFETCH(QString, sql);
+    RecordSet records(m_first->database(), sql);
+    const std::optional<DbError> error = records.open();
+    QVERIFY(error);
+    QVERIFY(!error->description.isEmpty());
+    QVERIFY(!records.isOpen());
+}
+
+QTEST_GUILESS_MAIN(TestRecordSet)
+#include "tst_recordset.moc"

@@ -1,0 +1,51 @@
+// Veltrix — KPI dashboard for small businesses.
+#pragma once
+
+#include "app/appcontext.h"
+#include "app/recordingprompter.h"
+#include "app/settingsstore.h"
+
+#include <QDir>
+#include <QFile>
+#include <QTemporaryDir>
+
+#include <memory>
+
+// A program folder, a shared database folder and a settings file of their own, with a fresh
+// context over them, so that each test starts from nothing.
+class TestWorkspace
+{
+public:
+    TestWorkspace()
+    {
+        QDir(m_root.path()).mkpath(QStringLiteral("app"));
+        QDir(m_root.path()).mkpath(QStringLiteral("shared"));
+        m_context = std::make_unique<AppContext>(
+            std::make_unique<SettingsStore>(m_root.filePath(QStringLiteral("settings.ini"))),
+            m_prompter, AppLocations::inFolder(appFolder()));
+    }
+
+    QString appFolder() const { return m_root.filePath(QStringLiteral("app")) + u'/'; }
+    QString sharedFolder() const { return m_root.filePath(QStringLiteral("shared")) + u'/'; }
+    QString mainDatabase() const { return sharedFolder() + QStringLiteral("main.db"); }
+    QString path(const QString &name) const { return m_root.filePath(name); }
+
+    AppContext &context() { return *m_context; }
+    RecordingPrompter &prompter() { return m_prompter; }
+    SettingsStore &store() { return m_context->settingsStore(); }
+
+    // Settings that pass every check, with main.db made from the template in the shared
+    // folder.
+    bool configure(const QString &package = QStringLiteral("MoneyWorks"))
+    {
+        store().writeSetting(QStringLiteral("DBPath"), sharedFolder());
+        store().writeSetting(QStringLiteral("AccPackage"), package);
+        store().writeSetting(QStringLiteral("AccFileDriver"), QStringLiteral("SQLite"));
+        return QFile::copy(QStringLiteral(VELTRIX_NEW_DB), appFolder() + QStringLiteral("new.db"));
+    }
+
+private:
+    QTemporaryDir m_root;
+    RecordingPrompter m_prompter;
+    std::unique_ptr<AppContext> m_context;
+};
