@@ -29,10 +29,10 @@ int main(int argc, char *argv[])
     QObject::connect(loading, &LoadingWindow::startupSucceeded, &app, [&] {
         // The main window is not part of this build yet: say where start-up got to, then end
         // the run in order.
-        prompter.message(u"Start-up is complete: the database at "_s
-                             + context.settings().mainDatabaseFile
-                             + u" is connected (database version "_s
-                             + context.mainDatabase().databaseVersion() + u")."_s,
+        prompter.message(u"Start-up is complete: the database at "_s +
+                             context.settings().mainDatabaseFile +
+                             u" is connected (database version "_s +
+                             context.mainDatabase().databaseVersion() + u")."_s,
                          u" Veltrix"_s, Prompter::Icon::Information);
         shutDown(context);
         QApplication::quit();

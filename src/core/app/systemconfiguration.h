@@ -17,11 +17,11 @@ public:
     struct Values
     {
         QString dbPath;
-        QString package;        // "MYOB", "MoneyWorks", or whatever the store held
+        QString package; // "MYOB", "MoneyWorks", or whatever the store held
         QString accFilePath;
         QString driver;
         QString user;
-        QString password;       // plain
+        QString password; // plain
     };
 
     SystemConfiguration(SettingsStore &store, Prompter &prompter);

@@ -20,8 +20,8 @@ bool ConfigValues::findRow(qint32 id) const
     config.requery();
     if (RecordOperations(m_database, m_prompter).findRecordById(config, id))
         return true;
-    m_prompter.message(u"Unable to set configuration with ID "_s + QString::number(id)
-                           + u"\r\nPlease contact the system administrator!"_s,
+    m_prompter.message(u"Unable to set configuration with ID "_s + QString::number(id) +
+                           u"\r\nPlease contact the system administrator!"_s,
                        AppInfo::Title, Prompter::Icon::None);
     return false;
 }

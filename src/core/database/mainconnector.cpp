@@ -49,8 +49,7 @@ QString connectMainDatabase(AppContext &context)
     database.close();
     database.setDatabaseVersion({});
 
-    std::optional<DbError> error =
-        database.connection().open(context.settings().mainDatabaseFile);
+    std::optional<DbError> error = database.connection().open(context.settings().mainDatabaseFile);
     if (!error && !database.isConnected())
         return u"Failed to connect to the main database!"_s;
     if (!error) {
@@ -66,8 +65,7 @@ QString connectMainDatabase(AppContext &context)
     const ConfigValues config(database, context.prompter());
     database.setDatabaseVersion(config.getConfigValue(ConfigValues::DatabaseVersion));
     return checkVersions(config.getConfigValue(ConfigValues::RequiredVersion),
-                         database.databaseVersion(), AppInfo::appVersion(),
-                         context.numberFormat());
+                         database.databaseVersion(), AppInfo::appVersion(), context.numberFormat());
 }
 
 void disconnectMainDatabase(AppContext &context)

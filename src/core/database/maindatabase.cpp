@@ -22,8 +22,8 @@ std::optional<DbError> MainDatabase::openTabRecordsets()
     for (int tab = 1; tab <= TabCount; ++tab) {
         RecordSet &recordset = m_tabs.at(tab - 1);
         recordset = RecordSet(database(),
-                              u"SELECT * FROM Fields WHERE Tab="_s + QString::number(tab)
-                                  + u" AND `Hide`<>1 ORDER BY `Order`"_s,
+                              u"SELECT * FROM Fields WHERE Tab="_s + QString::number(tab) +
+                                  u" AND `Hide`<>1 ORDER BY `Order`"_s,
                               RecordSet::Access::ReadOnly);
         if (const auto error = recordset.open())
             return error;

@@ -41,8 +41,7 @@ bool RecordOperations::findRecordById(RecordSet &records, qint64 id) const
     if (!error)
         error = records.findId(id);
     if (error) {
-        ErrorReporter(m_prompter).reportError(error->number, error->description,
-                                              u"Find Record"_s);
+        ErrorReporter(m_prompter).reportError(error->number, error->description, u"Find Record"_s);
         return false;
     }
     if (records.bof() || records.eof())
@@ -60,8 +59,8 @@ bool RecordOperations::deleteRecordById(RecordSet &records, qint64 id) const
     if (const auto error = records.deleteCurrent()) {
         // Another copy may have removed it first; either way the list must show the truth.
         records.requery();
-        ErrorReporter(m_prompter).reportError(error->number, error->description,
-                                              u"Delete Record"_s);
+        ErrorReporter(m_prompter)
+            .reportError(error->number, error->description, u"Delete Record"_s);
         return false;
     }
     records.requery();
@@ -72,8 +71,8 @@ std::optional<bool> RecordOperations::valueExists(const QString &table, const QS
                                                   const QString &value, DbError *error) const
 {
     RecordSet records(m_database.database(),
-                      u"SELECT "_s + column + u" FROM "_s + table + u" WHERE "_s
-                          + backQuoted(column) + u" LIKE ?"_s,
+                      u"SELECT "_s + column + u" FROM "_s + table + u" WHERE "_s +
+                          backQuoted(column) + u" LIKE ?"_s,
                       RecordSet::Access::ReadOnly, {value});
     if (const auto failure = records.open()) {
         if (error)
@@ -99,8 +98,8 @@ void RecordOperations::loadList(ListContent &list, const QString &table, const Q
         }
     }
     if (warn && list.items.isEmpty()) {
-        m_prompter.message(u"Unable to retrieve data records from the table '"_s + table + u'.'
-                               + column + u'\'',
+        m_prompter.message(u"Unable to retrieve data records from the table '"_s + table + u'.' +
+                               column + u'\'',
                            u"Load List Failed"_s, Prompter::Icon::Exclamation);
     }
 }

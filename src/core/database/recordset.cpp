@@ -273,9 +273,9 @@ std::optional<DbError> RecordSet::insertRow(Row &row)
     QSqlQuery query(m_database);
     const QString sql = columns.isEmpty()
                             ? u"INSERT INTO "_s + quoted(m_table) + u" DEFAULT VALUES"_s
-                            : u"INSERT INTO "_s + quoted(m_table) + u" ("_s + columns.join(u", "_s)
-                                  + u") VALUES ("_s
-                                  + QStringList(columns.size(), u"?"_s).join(u", "_s) + u')';
+                            : u"INSERT INTO "_s + quoted(m_table) + u" ("_s +
+                                  columns.join(u", "_s) + u") VALUES ("_s +
+                                  QStringList(columns.size(), u"?"_s).join(u", "_s) + u')';
     if (!query.prepare(sql))
         return SqliteConnection::errorFrom(query.lastError());
     for (const QVariant &value : std::as_const(values))
@@ -319,8 +319,8 @@ std::optional<DbError> RecordSet::updateRow(Row &row)
         return std::nullopt;
 
     QSqlQuery query(m_database);
-    if (!query.prepare(u"UPDATE "_s + quoted(m_table) + u" SET "_s + assignments.join(u", "_s)
-                       + u" WHERE "_s + checks.join(u" AND "_s)))
+    if (!query.prepare(u"UPDATE "_s + quoted(m_table) + u" SET "_s + assignments.join(u", "_s) +
+                       u" WHERE "_s + checks.join(u" AND "_s)))
         return SqliteConnection::errorFrom(query.lastError());
     for (const QVariant &value : std::as_const(assignmentValues))
         query.addBindValue(value);

@@ -66,7 +66,7 @@ private:
     struct Row
     {
         QVariantList values;
-        QVariantList original;   // as read; the optimistic check compares with these
+        QVariantList original; // as read; the optimistic check compares with these
         QList<bool> changed;
         bool isNew = false;
     };

@@ -40,7 +40,9 @@ DbError errorFromCode(int code, const QString &description)
 
 } // namespace
 
-SqliteConnection::SqliteConnection() : m_name(nextConnectionName()) {}
+SqliteConnection::SqliteConnection()
+    : m_name(nextConnectionName())
+{}
 
 SqliteConnection::~SqliteConnection()
 {
@@ -56,8 +58,7 @@ std::optional<DbError> SqliteConnection::open(const QString &file, Mode mode)
     QUrl uri = QUrl::fromLocalFile(file);
     uri.setQuery(mode == Mode::ExistingFile ? u"mode=rw"_s : u"mode=rwc"_s);
     database.setDatabaseName(uri.toString(QUrl::FullyEncoded));
-    database.setConnectOptions(
-        u"QSQLITE_OPEN_URI;QSQLITE_BUSY_TIMEOUT=%1"_s.arg(m_busyTimeoutMs));
+    database.setConnectOptions(u"QSQLITE_OPEN_URI;QSQLITE_BUSY_TIMEOUT=%1"_s.arg(m_busyTimeoutMs));
     if (!database.open())
         return errorFrom(database.lastError());
 

@@ -40,8 +40,8 @@ bool write(const QString &path, const PeriodDataSet::Slot &slot)
 {
     QByteArray content;
     for (int i = 0; i < slot.size(); ++i) {
-        content += (slot.fieldIds.value(i) + u'\t' + slot.fieldValues.value(i) + u'\t'
-                    + slot.fieldAbs.value(i) + u'\t' + slot.fieldTypes.value(i) + u"\r\n"_s)
+        content += (slot.fieldIds.value(i) + u'\t' + slot.fieldValues.value(i) + u'\t' +
+                    slot.fieldAbs.value(i) + u'\t' + slot.fieldTypes.value(i) + u"\r\n"_s)
                        .toUtf8();
     }
     QSaveFile file(path);

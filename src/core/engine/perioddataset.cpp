@@ -29,7 +29,9 @@ double roundHalfToEven(double value, int decimals)
 
 } // namespace
 
-PeriodDataSet::PeriodDataSet(const NumberFormat &numberFormat) : m_numberFormat(numberFormat) {}
+PeriodDataSet::PeriodDataSet(const NumberFormat &numberFormat)
+    : m_numberFormat(numberFormat)
+{}
 
 void PeriodDataSet::setCurrentSlot(quint8 slot)
 {

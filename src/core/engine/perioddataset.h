@@ -21,8 +21,8 @@ public:
     // How a figure is rounded when stored, and what an account figure's sign means.
     enum TypeCode {
         Money = 0,
-        Ratio = 1,          // stored as a percentage
-        AccountFigure = 2,  // as the accounting package gives it; read back negated
+        Ratio = 1,         // stored as a percentage
+        AccountFigure = 2, // as the accounting package gives it; read back negated
         Count = 3,
         OneDecimal = 4,
         ComputedMoney = 5,

@@ -8,6 +8,6 @@ struct LoginState
 {
     bool loggedIn = false;
     QString currentUser;
-    int currentUserType = 0;     // 0 standard user, 1 administrator
-    QString currentUserFields;   // the Field IDs the user may see
+    int currentUserType = 0;   // 0 standard user, 1 administrator
+    QString currentUserFields; // the Field IDs the user may see
 };

@@ -23,7 +23,9 @@ constexpr int QuitWaitMs = 3000;
 
 } // namespace
 
-WebPageOpener::WebPageOpener(QString profileFolder) : m_profileFolder(std::move(profileFolder)) {}
+WebPageOpener::WebPageOpener(QString profileFolder)
+    : m_profileFolder(std::move(profileFolder))
+{}
 
 WebPageOpener::~WebPageOpener()
 {
@@ -101,8 +103,8 @@ QString WebPageOpener::updatePageUrl(const QString &host, const QString &appVers
                                      const QString &databaseVersion, bool fromLoadingWindow)
 {
     const QString path = fromLoadingWindow ? u"/vx/mw/updates.php"_s : u"/vx/updates.php"_s;
-    return u"http://"_s + host + path + u"?appver="_s + encoded(appVersion) + u"&dbver="_s
-           + encoded(databaseVersion);
+    return u"http://"_s + host + path + u"?appver="_s + encoded(appVersion) + u"&dbver="_s +
+           encoded(databaseVersion);
 }
 
 QString WebPageOpener::coachingPageUrl(const QString &host, const QString &siteName)

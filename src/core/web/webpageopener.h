@@ -32,8 +32,7 @@ public:
     void setBrowserProgram(const QString &program) { m_browserProgram = program; }
 
     // The screen to centre on; an empty rectangle leaves the position to the browser.
-    std::optional<DbError> openWebPage(const QString &url, const QSize &size,
-                                       const QRect &screen);
+    std::optional<DbError> openWebPage(const QString &url, const QSize &size, const QRect &screen);
     void closeWindow();
     bool hasWindow() const;
 

@@ -103,8 +103,8 @@ void ConfigDialog::buildLayout()
     m_txtAccPassword = new QLineEdit(m_picLogin);
     m_txtAccPassword->setObjectName(u"txtAccPassword"_s);
     m_txtAccPassword->setEchoMode(QLineEdit::Password);
-    auto *driverHint = new QLabel(u"(this driver must exist in the ODBC drivers list)"_s,
-                                  m_picLogin);
+    auto *driverHint =
+        new QLabel(u"(this driver must exist in the ODBC drivers list)"_s, m_picLogin);
     driverHint->setEnabled(false);
     auto *loginForm = new QFormLayout(m_picLogin);
     loginForm->addRow(u"Driver"_s, m_lstDriver);
@@ -178,7 +178,7 @@ void ConfigDialog::browseFile()
 
 void ConfigDialog::accept()
 {
-    SystemConfiguration::Values values{m_txtDBPath->text(), m_packageName,
+    SystemConfiguration::Values values{m_txtDBPath->text(),      m_packageName,
                                        m_txtAccFilePath->text(), m_lstDriver->currentText(),
                                        m_txtAccUsername->text(), m_txtAccPassword->text()};
     const bool saved = m_configuration.save(values);

@@ -1,0 +1,192 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "testworkspace.h"
+
+#include "app/shutdown.h"
+#include "app/startupsequence.h"
+#include "app/version.h"
+#include "engine/cachefile.h"
+#include "sources/accountingsource.h"
+
+#include <QSqlQuery>
+#include <QTest>
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+class CountingSource : public AccountingSource
+{
+public:
+    explicit CountingSource(int &disconnects)
+        : m_disconnects(disconnects)
+    {}
+    void disconnect() override { ++m_disconnects; }
+
+private:
+    int &m_disconnects;
+};
+
+} // namespace
+
+class TestStartupShutdown : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void appVersion_data();
+    void appVersion();
+    void outcomes_data();
+    void outcomes();
+    void failedStartLeavesNoConnection();
+    void shutDownKeepsSlotZero();
+    void shutDownWithEmptySlotKeepsOldCache();
+    void shutDownLogsOffOnlyALoggedInUser();
+    void cacheWrittenAtShutDownIsReadAtNextStart();
+};
+
+void TestStartupShutdown::appVersion_data()
+{
+    QTest::addColumn<int>("major");
+    QTest::addColumn<int>("minor");
+    QTest::addColumn<int>("revision");
+    QTest::addColumn<QString>("expected");
+    QTest::newRow("1.5.5") << 1 << 5 << 5 << u"1.55"_s;
+    QTest::newRow("2.0.0") << 2 << 0 << 0 << u"2.00"_s;
+    QTest::newRow("1.1.12") << 1 << 1 << 12 << u"1.11"_s;
+}
+
+void TestStartupShutdown::appVersion()
+{
+    QFETCH(int, major);
+    QFETCH(int, minor);
+    QFETCH(int, revision);
+    QFETCH(QString, expected);
+    QCOMPARE(AppInfo::appVersionFrom(major, minor, revision), expected);
+    QCOMPARE(AppInfo::appVersion(), u"1.55"_s);
+}
+
+void TestStartupShutdown::outcomes_data()
+{
+    QTest::addColumn<bool>("configure");
+    QTest::addColumn<QString>("requiredVersion");
+    QTest::addColumn<QString>("message");
+    QTest::addColumn<bool>("updateNeeded");
+    QTest::newRow("fresh install")
+        << false << QString() << u"Your accounting package must be specified!"_s << false;
+    QTest::newRow("all well") << true << QString() << QString() << false;
+    QTest::newRow("program too old")
+        << true << u"9.99"_s << u"You must update Veltrix to work with the new database!"_s << true;
+}
+
+void TestStartupShutdown::outcomes()
+{
+    QFETCH(bool, configure);
+    QFETCH(QString, requiredVersion);
+    QFETCH(QString, message);
+    QFETCH(bool, updateNeeded);
+    TestWorkspace workspace;
+    if (configure)
+        QVERIFY(workspace.configure());
+    if (!requiredVersion.isEmpty()) {
+        QVERIFY(QFile::copy(QStringLiteral(VELTRIX_NEW_DB), workspace.mainDatabase()));
+        QFile::setPermissions(workspace.mainDatabase(),
+                              QFileDevice::ReadOwner | QFileDevice::WriteOwner);
+        SqliteConnection connection;
+        QCOMPARE(connection.open(workspace.mainDatabase()), std::nullopt);
+        QVERIFY(
+            QSqlQuery(connection.database())
+                .exec(u"UPDATE Config SET Value = '"_s + requiredVersion + u"' WHERE ID = 2"_s));
+    }
+    const StartupOutcome outcome = runStartupSequence(workspace.context());
+    QCOMPARE(outcome.message, message);
+    QCOMPARE(outcome.failed, !message.isEmpty());
+    QCOMPARE(outcome.updateNeeded, updateNeeded);
+    QCOMPARE(workspace.context().mainDatabase().isConnected(), message.isEmpty());
+}
+
+void TestStartupShutdown::failedStartLeavesNoConnection()
+{
+    TestWorkspace workspace;
+    QVERIFY(workspace.configure());
+    QVERIFY(QFile::copy(QStringLiteral(VELTRIX_NEW_DB), workspace.mainDatabase()));
+    QFile::setPermissions(workspace.mainDatabase(),
+                          QFileDevice::ReadOwner | QFileDevice::WriteOwner);
+    {
+        SqliteConnection connection;
+        QCOMPARE(connection.open(workspace.mainDatabase()), std::nullopt);
+        QVERIFY(
+            QSqlQuery(connection.database()).exec(u"UPDATE Config SET Value='1.0' WHERE ID=1"_s));
+    }
+    const StartupOutcome outcome = runStartupSequence(workspace.context());
+    QVERIFY(outcome.failed);
+    QVERIFY(outcome.updateNeeded);
+    QVERIFY(!workspace.context().mainDatabase().isConnected());
+}
+
+void TestStartupShutdown::shutDownKeepsSlotZero()
+{
+    TestWorkspace workspace;
+    QVERIFY(workspace.configure());
+    QVERIFY(!runStartupSequence(workspace.context()).failed);
+    AppContext &context = workspace.context();
+    int disconnects = 0;
+    context.setAccountingSource(std::make_unique<CountingSource>(disconnects));
+    PeriodDataSet &data = context.periodDataSet();
+    data.storeFieldValue(79, 1500.0, 0);
+    data.setCurrentSlot(3); // the comparison window left another slot current
+    data.storeFieldValue(79, 99.0, 0);
+    QFile(context.settings().tempFolder + u"tmp.html"_s).open(QIODevice::WriteOnly);
+
+    shutDown(context);
+
+    PeriodDataSet::Slot written;
+    QCOMPARE(CacheFile::read(context.settings().cacheFile, written), std::nullopt);
+    QCOMPARE(written.fieldIds, QStringList{u"79"_s});
+    QCOMPARE(written.fieldValues, QStringList{u"1500"_s});
+    QVERIFY(!context.mainDatabase().isConnected());
+    QCOMPARE(disconnects, 1);
+    QVERIFY(!QFileInfo::exists(context.settings().tempFolder));
+}
+
+void TestStartupShutdown::shutDownWithEmptySlotKeepsOldCache()
+{
+    TestWorkspace workspace;
+    QVERIFY(workspace.configure());
+    QVERIFY(!runStartupSequence(workspace.context()).failed);
+    const QString cache = workspace.context().settings().cacheFile;
+    QVERIFY(!QFileInfo::exists(cache));
+    shutDown(workspace.context());
+    QVERIFY(!QFileInfo::exists(cache));
+}
+
+void TestStartupShutdown::shutDownLogsOffOnlyALoggedInUser()
+{
+    TestWorkspace workspace;
+    QVERIFY(workspace.configure());
+    QVERIFY(!runStartupSequence(workspace.context()).failed);
+    int logoffs = 0;
+    shutDown(workspace.context(), [&] { ++logoffs; });
+    QCOMPARE(logoffs, 0);
+    workspace.context().loginState().loggedIn = true;
+    shutDown(workspace.context(), [&] { ++logoffs; });
+    QCOMPARE(logoffs, 1);
+}
+
+void TestStartupShutdown::cacheWrittenAtShutDownIsReadAtNextStart()
+{
+    TestWorkspace workspace;
+    QVERIFY(workspace.configure());
+    QVERIFY(!runStartupSequence(workspace.context()).failed);
+    workspace.context().periodDataSet().storeFieldValue(104, 0.1234, 1);
+    workspace.context().periodDataSet().storeAccountFigure(13, -5000.0, 2);
+    shutDown(workspace.context());
+
+    workspace.context().periodDataSet().slot(0) = PeriodDataSet::Slot();
+    QVERIFY(!runStartupSequence(workspace.context()).failed);
+    const PeriodDataSet &data = workspace.context().periodDataSet();
+    QCOMPARE(data.getFieldValue(104), 12.3);
+    QCOMPARE(data.getFieldValue(13), 5000.0);
+}
+
+QTEST_GUILESS_MAIN(TestStartupShutdown)
+#include "tst_startupshutdown.moc"

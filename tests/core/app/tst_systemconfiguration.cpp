@@ -1,0 +1,163 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "testworkspace.h"
+
+#include "app/settingsloader.h"
+#include "app/systemconfiguration.h"
+
+#include <QTest>
+
+using namespace Qt::StringLiterals;
+
+namespace {
+const auto FolderMissing = u"The remote path you specified does not exist or is inacessible!"_s;
+const auto FileMissing =
+    u"The account data file path you specified does not exist or is inacessible!"_s;
+const auto FileNotGiven = u"You must specify the path to the MYOB data file!"_s;
+const auto DriverNotGiven = u"You must specify the MYOB database driver!"_s;
+} // namespace
+
+class TestSystemConfiguration : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void checksInOrder_data();
+    void checksInOrder();
+    void savesEverythingWithThePasswordEnciphered();
+    void pathEndingInSlashIsKept();
+    void unknownPackageIsWrittenBackAsItWas();
+    void emptyStoreLoadsEmptyValues();
+    void fileFilters();
+};
+
+void TestSystemConfiguration::checksInOrder_data()
+{
+    QTest::addColumn<QString>("dbPath"); // "<shared>" stands for an existing folder
+    QTest::addColumn<QString>("package");
+    QTest::addColumn<QString>("file"); // "<file>" stands for an existing file
+    QTest::addColumn<QString>("driver");
+    QTest::addColumn<QString>("message");
+    QTest::addColumn<QString>("title");
+
+    QTest::newRow("missing folder first") << u"/no/such/folder"_s << u"MYOB"_s << QString()
+                                          << QString() << FolderMissing << u"Invalid Folder Path"_s;
+    QTest::newRow("MYOB without file") << u"<shared>"_s << u"MYOB"_s << QString() << QString()
+                                       << FileNotGiven << u"MYOB Data File Path Not Specified"_s;
+    QTest::newRow("MYOB, missing file, no driver")
+        << u"<shared>"_s << u"MYOB"_s << u"/no/file.myo"_s << QString() << DriverNotGiven
+        << u"MYOB ODBC Driver Not Specified"_s;
+    QTest::newRow("MYOB, missing file, driver")
+        << u"<shared>"_s << u"MYOB"_s << u"/no/file.myo"_s << u"MYOAU0901"_s << FileMissing
+        << u"Invalid File Path"_s;
+    QTest::newRow("MoneyWorks, missing file")
+        << u"<shared>"_s << u"MoneyWorks"_s << u"/no/Acme.mwd5"_s << QString() << FileMissing
+        << u"Invalid File Path"_s;
+    QTest::newRow("MoneyWorks with nothing else")
+        << u"<shared>"_s << u"MoneyWorks"_s << QString() << QString() << QString() << QString();
+    QTest::newRow("MYOB complete")
+        << u"<shared>"_s << u"MYOB"_s << u"<file>"_s << u"SQLite"_s << QString() << QString();
+}
+
+void TestSystemConfiguration::checksInOrder()
+{
+    QFETCH(QString, dbPath);
+    QFETCH(QString, package);
+    QFETCH(QString, file);
+    QFETCH(QString, driver);
+    QFETCH(QString, message);
+    QFETCH(QString, title);
+
+    TestWorkspace workspace;
+    QFile(workspace.path(u"company.myo"_s)).open(QIODevice::WriteOnly);
+    dbPath.replace(u"<shared>"_s, workspace.sharedFolder());
+    file.replace(u"<file>"_s, workspace.path(u"company.myo"_s));
+
+    SystemConfiguration configuration(workspace.store(), workspace.prompter());
+    SystemConfiguration::Values values{dbPath, package, file, driver, u"Admin"_s, u"pw"_s};
+    QCOMPARE(configuration.save(values), message.isEmpty());
+    if (message.isEmpty()) {
+        QVERIFY(workspace.prompter().messages().isEmpty());
+        QCOMPARE(workspace.store().readSetting(u"AccPackage"_s), package);
+        return;
+    }
+    QCOMPARE(workspace.prompter().messages().size(), 1);
+    QCOMPARE(workspace.prompter().messages().first().text, message);
+    QCOMPARE(workspace.prompter().messages().first().title, title);
+    QCOMPARE(workspace.prompter().messages().first().icon, Prompter::Icon::Exclamation);
+    // Nothing is written until every check passes.
+    QCOMPARE(workspace.store().readSetting(u"DBPath"_s), QString());
+    QCOMPARE(workspace.store().readSetting(u"AccPackage"_s), QString());
+}
+
+void TestSystemConfiguration::savesEverythingWithThePasswordEnciphered()
+{
+    TestWorkspace workspace;
+    QFile(workspace.path(u"company.myo"_s)).open(QIODevice::WriteOnly);
+    SystemConfiguration configuration(workspace.store(), workspace.prompter());
+    const QString folder = workspace.sharedFolder().chopped(1);
+    SystemConfiguration::Values values{folder,      u"MYOB"_s,  workspace.path(u"company.myo"_s),
+                                       u"SQLite"_s, u"Admin"_s, u"Sp@nner 7"_s};
+    QVERIFY(configuration.save(values));
+    QCOMPARE(values.dbPath, folder + QDir::separator());
+
+    SettingsStore &store = workspace.store();
+    QCOMPARE(store.readSetting(u"DBPath"_s), folder + QDir::separator());
+    QCOMPARE(store.readSetting(u"AccFileDriver"_s), u"SQLite"_s);
+    QCOMPARE(store.readSetting(u"AccFileUser"_s), u"Admin"_s);
+    const QString stored = store.readSetting(u"AccFilePass"_s);
+    QVERIFY(!stored.isEmpty());
+    QVERIFY(!stored.contains(u"Sp@nner"_s));
+
+    const SystemConfiguration::Values back = configuration.load();
+    QCOMPARE(back.password, u"Sp@nner 7"_s);
+    QCOMPARE(back.accFilePath, workspace.path(u"company.myo"_s));
+
+    // Start-up reads the same plain password.
+    QVERIFY(QFile::copy(QStringLiteral(VELTRIX_NEW_DB), workspace.appFolder() + u"new.db"_s));
+    QCOMPARE(loadSettings(workspace.context()), QString());
+    QCOMPARE(workspace.context().settings().accFilePass, u"Sp@nner 7"_s);
+}
+
+void TestSystemConfiguration::pathEndingInSlashIsKept()
+{
+    TestWorkspace workspace;
+    SystemConfiguration configuration(workspace.store(), workspace.prompter());
+    SystemConfiguration::Values values{workspace.sharedFolder(), u"MoneyWorks"_s, {}, {}, {}, {}};
+    QVERIFY(configuration.save(values));
+    QCOMPARE(workspace.store().readSetting(u"DBPath"_s), workspace.sharedFolder());
+    QCOMPARE(workspace.store().readSetting(u"AccFilePass"_s), QString());
+}
+
+void TestSystemConfiguration::unknownPackageIsWrittenBackAsItWas()
+{
+    TestWorkspace workspace;
+    workspace.store().writeSetting(u"AccPackage"_s, u"myob"_s);
+    SystemConfiguration configuration(workspace.store(), workspace.prompter());
+    SystemConfiguration::Values values = configuration.load();
+    QCOMPARE(values.package, u"myob"_s);
+    values.dbPath = workspace.sharedFolder();
+    QVERIFY(configuration.save(values));
+    QCOMPARE(workspace.store().readSetting(u"AccPackage"_s), u"myob"_s);
+    QCOMPARE(loadSettings(workspace.context()), u"Your accounting package must be specified!"_s);
+}
+
+void TestSystemConfiguration::emptyStoreLoadsEmptyValues()
+{
+    TestWorkspace workspace;
+    const SystemConfiguration::Values values =
+        SystemConfiguration(workspace.store(), workspace.prompter()).load();
+    QCOMPARE(values.dbPath, QString());
+    QCOMPARE(values.package, QString());
+    QCOMPARE(values.password, QString());
+}
+
+void TestSystemConfiguration::fileFilters()
+{
+    QVERIFY(SystemConfiguration::fileFilter(u"MoneyWorks"_s).startsWith(u"MoneyWorks Files ("_s));
+    QVERIFY(
+        SystemConfiguration::fileFilter(u"MYOB"_s).contains(u"*.myo *.myb *.dat *.pls *.prm"_s));
+    QVERIFY(SystemConfiguration::driverNames().contains(u"SQLite"_s));
+}
+
+QTEST_GUILESS_MAIN(TestSystemConfiguration)
+#include "tst_systemconfiguration.moc"
