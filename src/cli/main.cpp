@@ -2,7 +2,9 @@
 // veltrix-cli: the program's core without windows, for scripts, provisioning and tests.
 
 #include "databaseverbs.h"
+#include "demoverb.h"
 #include "passwordverbs.h"
+#include "produceverb.h"
 
 #include <QCoreApplication>
 #include <QTextStream>
@@ -28,6 +30,12 @@ const QList<Verb> &verbs()
          PasswordVerbs::encryptPassword},
         {u"decrypt-password"_s, u"STORED"_s, u"print the password a stored value holds"_s,
          PasswordVerbs::decryptPassword},
+        {u"make-demo"_s, u"DIR [--use]"_s, u"write a demo workspace (database, company file, settings)"_s,
+         DemoVerb::makeDemo},
+        {u"produce"_s,
+         u"--from YYYY-MM --to YYYY-MM --user NAME --password PW [--settings FILE] "
+         u"[--compare years|periods --count N] [--format csv|json]"_s,
+         u"produce a range and print its figures"_s, ProduceVerb::produce},
         {u"create-database"_s, u"SCRIPT OUTPUT"_s, u"make a database file from a SQL script"_s,
          DatabaseVerbs::createDatabase},
     };

@@ -40,9 +40,10 @@ void MainDatabase::requeryFields()
 
 void MainDatabase::close()
 {
+    // The record sets hold the connection too; let go of them before it closes.
     for (RecordSet *recordset : {&m_config, &m_users, &m_hours, &m_fields})
-        recordset->close();
+        *recordset = RecordSet();
     for (RecordSet &tab : m_tabs)
-        tab.close();
+        tab = RecordSet();
     m_connection.close();
 }

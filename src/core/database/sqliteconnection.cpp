@@ -49,22 +49,39 @@ SqliteConnection::~SqliteConnection()
     close();
 }
 
-std::optional<DbError> SqliteConnection::open(const QString &file, Mode mode)
+std::optional<DbError> SqliteConnection::open(const QString &file, Mode mode,
+                                              const OpenHook &onOpened)
 {
     close();
     m_file = file;
     QSqlDatabase database = QSqlDatabase::addDatabase(u"QSQLITE"_s, m_name);
     // A URI lets the open refuse a missing file instead of creating an empty database.
     QUrl uri = QUrl::fromLocalFile(file);
-    uri.setQuery(mode == Mode::ExistingFile ? u"mode=rw"_s : u"mode=rwc"_s);
+    switch (mode) {
+    case Mode::ExistingFile:
+        uri.setQuery(u"mode=rw"_s);
+        break;
+    case Mode::CreateFile:
+        uri.setQuery(u"mode=rwc"_s);
+        break;
+    case Mode::ReadOnly:
+        uri.setQuery(u"mode=ro"_s);
+        break;
+    }
     database.setDatabaseName(uri.toString(QUrl::FullyEncoded));
     database.setConnectOptions(u"QSQLITE_OPEN_URI;QSQLITE_BUSY_TIMEOUT=%1"_s.arg(m_busyTimeoutMs));
     if (!database.open())
         return errorFrom(database.lastError());
+    if (onOpened)
+        onOpened(handleOf(database));
 
     // The first statements touch the file: a file that is not a database fails here.
     QSqlQuery query(database);
-    for (const QString &pragma : {u"PRAGMA journal_mode=DELETE"_s, u"PRAGMA foreign_keys=ON"_s}) {
+    const QStringList pragmas = mode == Mode::ReadOnly
+                                    ? QStringList{u"PRAGMA schema_version"_s}
+                                    : QStringList{u"PRAGMA journal_mode=DELETE"_s,
+                                                  u"PRAGMA foreign_keys=ON"_s};
+    for (const QString &pragma : pragmas) {
         if (!query.exec(pragma)) {
             const DbError error = errorFrom(query.lastError());
             query.finish();
@@ -94,6 +111,11 @@ bool SqliteConnection::isOpen() const
 QSqlDatabase SqliteConnection::database() const
 {
     return QSqlDatabase::database(m_name, false);
+}
+
+sqlite3 *SqliteConnection::handle() const
+{
+    return isOpen() ? handleOf(database()) : nullptr;
 }
 
 std::optional<DbError> SqliteConnection::executeScript(const QString &sql)

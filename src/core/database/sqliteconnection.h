@@ -6,9 +6,11 @@
 #include <QSqlDatabase>
 #include <QString>
 
+#include <functional>
 #include <optional>
 
 class QSqlError;
+struct sqlite3;
 
 // One connection to a SQLite database file, closed and removed when the object goes. Each
 // object has its own connection name, so two of them may open the same file, as two copies of
@@ -16,7 +18,10 @@ class QSqlError;
 class SqliteConnection
 {
 public:
-    enum class Mode { ExistingFile, CreateFile };
+    enum class Mode { ExistingFile, CreateFile, ReadOnly };
+    // Runs on the raw handle right after opening, before any statement: the place to
+    // register collations that the file's tables name.
+    using OpenHook = std::function<void(sqlite3 *)>;
 
     SqliteConnection();
     ~SqliteConnection();
@@ -25,11 +30,14 @@ public:
 
     // Opens the file, waiting up to the busy timeout for other copies' locks. The file is
     // kept in rollback-journal mode, which works on network shares where WAL does not.
-    std::optional<DbError> open(const QString &file, Mode mode = Mode::ExistingFile);
+    std::optional<DbError> open(const QString &file, Mode mode = Mode::ExistingFile,
+                                const OpenHook &onOpened = {});
     void close();
     bool isOpen() const;
 
     QSqlDatabase database() const;
+    // The SQLite handle under the Qt connection; null when closed.
+    sqlite3 *handle() const;
     QString fileName() const { return m_file; }
 
     // Runs several statements separated by semicolons, such as a schema script.

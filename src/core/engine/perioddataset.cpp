@@ -1,6 +1,8 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "perioddataset.h"
 
+#include "rounding.h"
+
 #include "app/numberformat.h"
 
 #include <QLocale>
@@ -8,26 +10,6 @@
 #include <cmath>
 
 using namespace Qt::StringLiterals;
-
-namespace {
-
-double roundHalfAwayFromZero(double value, int decimals)
-{
-    const double scale = std::pow(10.0, decimals);
-    // The decimal text of the value decides, not its binary neighbour: 0.125 is exact, but
-    // 52.375 * 100 must not land on 5237.4999.
-    const double scaled = QLocale::c().toString(value * scale, 'f', 6).toDouble();
-    return std::round(scaled) / scale;
-}
-
-double roundHalfToEven(double value, int decimals)
-{
-    const double scale = std::pow(10.0, decimals);
-    const double scaled = QLocale::c().toString(value * scale, 'f', 6).toDouble();
-    return std::nearbyint(scaled) / scale;
-}
-
-} // namespace
 
 PeriodDataSet::PeriodDataSet(const NumberFormat &numberFormat)
     : m_numberFormat(numberFormat)
@@ -106,19 +88,19 @@ double PeriodDataSet::roundForStorage(double value, int typeCode)
     switch (typeCode) {
     case Money:
     case ComputedMoney:
-        rounded = roundHalfAwayFromZero(value, 2);
+        rounded = Rounding::halfAwayFromZero(value, 2);
         break;
     case Ratio:
-        rounded = roundHalfAwayFromZero(value * 100.0, 1);
+        rounded = Rounding::halfAwayFromZero(value * 100.0, 1);
         break;
     case AccountFigure:
-        rounded = roundHalfAwayFromZero(value, 1);
+        rounded = Rounding::halfAwayFromZero(value, 1);
         break;
     case Count:
-        rounded = roundHalfToEven(value, 0);
+        rounded = Rounding::halfToEven(value, 0);
         break;
     case OneDecimal:
-        rounded = roundHalfToEven(value, 1);
+        rounded = Rounding::halfToEven(value, 1);
         break;
     default:
         return 0.0;
@@ -141,15 +123,15 @@ QString PeriodDataSet::formatFieldValue(double value, int typeCode, bool storage
         switch (typeCode) {
         case Money:
         case ComputedMoney:
-            return locale.toString(roundHalfAwayFromZero(value, 2), 'f', 2);
+            return locale.toString(Rounding::halfAwayFromZero(value, 2), 'f', 2);
         case Ratio:
-            return locale.toString(roundHalfAwayFromZero(value * 100.0, 1), 'f', 1);
+            return locale.toString(Rounding::halfAwayFromZero(value * 100.0, 1), 'f', 1);
         case AccountFigure:
-            return locale.toString(roundHalfAwayFromZero(value, 1), 'f', 1);
+            return locale.toString(Rounding::halfAwayFromZero(value, 1), 'f', 1);
         case Count:
-            return locale.toString(roundHalfToEven(value, 0), 'f', 0);
+            return locale.toString(Rounding::halfToEven(value, 0), 'f', 0);
         case OneDecimal:
-            return locale.toString(roundHalfToEven(value, 1), 'f', 1);
+            return locale.toString(Rounding::halfToEven(value, 1), 'f', 1);
         default:
             return {};
         }
@@ -158,9 +140,9 @@ QString PeriodDataSet::formatFieldValue(double value, int typeCode, bool storage
     case 1:
         return {};
     case 3:
-        return locale.toString(roundHalfToEven(value, 1), 'f', 1) + u'%';
+        return locale.toString(Rounding::halfToEven(value, 1), 'f', 1) + u'%';
     case 4:
-        return locale.toString(roundHalfToEven(value, 0), 'f', 0);
+        return locale.toString(Rounding::halfToEven(value, 0), 'f', 0);
     default:
         return m_numberFormat.formatMoney(value, true);
     }

@@ -21,6 +21,10 @@ public:
         : m_disconnects(disconnects)
     {}
     void disconnect() override { ++m_disconnects; }
+    bool isReachable() override { return true; }
+    std::optional<DbError> openDataFile() override { return std::nullopt; }
+    double accountMovement(const QString &, const QDate &, const QDate &) override { return 0; }
+    qint16 jobsCount(const QDate &, const QDate &) override { return 0; }
 
 private:
     int &m_disconnects;

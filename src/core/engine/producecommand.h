@@ -1,0 +1,34 @@
+// Veltrix — KPI dashboard for small businesses.
+#pragma once
+
+#include <QDate>
+
+class AppContext;
+
+// Turns a choice of months into figures in slot 0: makes sure the accounting package can be
+// reached (opening the configured data file when nothing is open), checks the range, loads it
+// and remembers the choice for the next start. The windows rebuild their views afterwards.
+class ProduceCommand
+{
+public:
+    struct Selection
+    {
+        int firstMonth = 1;   // 1 to 12
+        int firstYear = 0;
+        int lastMonth = 1;
+        int lastYear = 0;
+    };
+
+    enum class Outcome { Produced, NoSource, InvalidRange, Failed };
+
+    explicit ProduceCommand(AppContext &context);
+
+    Outcome produce(const Selection &selection);
+
+    // The first day of the first month and the last day of the last month.
+    static QDate rangeStart(const Selection &selection);
+    static QDate rangeEnd(const Selection &selection);
+
+private:
+    AppContext &m_context;
+};

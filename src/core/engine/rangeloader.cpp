@@ -1,0 +1,113 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "rangeloader.h"
+
+#include "formulatable.h"
+#include "perioddataset.h"
+
+#include "app/appcontext.h"
+#include "app/prompter.h"
+#include "database/recordoperations.h"
+#include "sources/accountingsource.h"
+
+using namespace Qt::StringLiterals;
+
+RangeLoader::RangeLoader(AppContext &context) : m_context(context) {}
+
+int RangeLoader::workingDays(const QDate &start, const QDate &end)
+{
+    int count = 0;
+    for (QDate day = start; day.isValid() && day <= end; day = day.addDays(1)) {
+        if (day.dayOfWeek() <= 5)
+            ++count;
+    }
+    return count;
+}
+
+double RangeLoader::hourlyRate(int recordId)
+{
+    RecordSet &hours = m_context.mainDatabase().hoursRecordset();
+    if (!RecordOperations(m_context.mainDatabase(), m_context.prompter())
+             .findRecordById(hours, recordId))
+        return 0.0;
+    const QVariant rate = hours.value(u"Value"_s);
+    return rate.isNull() ? 0.0 : m_context.numberFormat().toNumber(rate);
+}
+
+void RangeLoader::loadDateRange(const QDate &start, const QDate &end)
+{
+    const BusyPointer busy(m_context.prompter());
+    const int daySpan = int(start.daysTo(end));
+    const int working = workingDays(start, end);
+    const bool beyondPeriod = outOfRange(start, end);
+
+    m_context.periodDataSet().clearCurrent();
+    if (!beyondPeriod)
+        loadAccountFigures(start, end);
+
+    AccountingSource *source = m_context.accountingSource();
+    const int jobs = source ? source->jobsCount(start, end) : 0;
+    computeFormulas(daySpan, working, jobs);
+}
+
+bool RangeLoader::outOfRange(const QDate &start, const QDate &end)
+{
+    AccountingSource *source = m_context.accountingSource();
+    if (!source)
+        return false;
+    const std::optional<QDate> periodEnd = source->currentPeriodEnd();
+    if (!periodEnd)
+        return false;
+    // A period end that cannot be read counts as the earliest date: nothing is in range.
+    if (periodEnd->isValid() && end <= *periodEnd)
+        return false;
+    const QLocale &locale = m_context.numberFormat().locale();
+    const auto shortDate = [&](const QDate &date) {
+        return date.isValid() ? locale.toString(date, QLocale::ShortFormat) : QString();
+    };
+    m_context.prompter().message(u"The selected date range "_s + shortDate(start) + u" to "_s
+                                     + shortDate(end) + u" exceeds the\r\naccounting period of "_s
+                                     + u"your MoneyWorks file which ends "_s
+                                     + shortDate(*periodEnd) + u"!"_s,
+                                 u"Data Out Of Range"_s, Prompter::Icon::Exclamation);
+    return true;
+}
+
+void RangeLoader::loadAccountFigures(const QDate &start, const QDate &end)
+{
+    RecordSet &fields = m_context.mainDatabase().fieldsRecordset();
+    if (fields.moveFirst())
+        return;
+    AccountingSource *source = m_context.accountingSource();
+    PeriodDataSet &data = m_context.periodDataSet();
+    for (; !fields.eof(); fields.moveNext()) {
+        const int type = fields.value(u"Type"_s).toInt();
+        if (type != 2)
+            continue;
+        double total = 0.0;
+        const QStringList codes = fields.value(u"Data"_s).toString().split(u'+');
+        for (const QString &code : codes) {
+            const QString trimmed = code.trimmed();
+            if (!trimmed.isEmpty() && source)
+                total += source->accountMovement(trimmed, start, end);
+        }
+        data.storeAccountFigure(fields.value(u"ID"_s).toLongLong(), total, type);
+    }
+}
+
+void RangeLoader::computeFormulas(int daySpan, int workingDays, int jobs)
+{
+    PeriodDataSet &data = m_context.periodDataSet();
+    Formula::Inputs inputs;
+    inputs.value = [&](int id) { return data.getFieldValue(id); };
+    inputs.magnitude = [&](int id) { return data.getFieldAbs(id); };
+    inputs.sum = [&](int first, int last) { return data.sumFieldValues(first, last); };
+    inputs.hourlyRate = [&](int id) { return hourlyRate(id); };
+    inputs.daySpan = daySpan;
+    inputs.workingDays = workingDays;
+    inputs.jobs = jobs;
+
+    for (const FormulaTable::Step &step : FormulaTable::steps()) {
+        if (const std::optional<double> value = step.formula.evaluate(inputs))
+            data.storeFieldValue(step.field, *value, step.typeCode);
+    }
+}

@@ -1,0 +1,41 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "rounding.h"
+
+#include <QByteArray>
+
+#include <cmath>
+
+namespace Rounding {
+
+namespace {
+
+// The value scaled by 10^decimals, taken through its decimal text, so that the binary error of
+// the multiplication (5237.4999999 for 52.375 * 100) does not decide. Fifteen significant
+// digits are what a double holds reliably; more would bring the binary error back.
+double scaledThroughText(double value, int decimals)
+{
+    const QByteArray text = QByteArray::number(value, 'g', 15) + 'e' + QByteArray::number(decimals);
+    return text.toDouble();
+}
+
+} // namespace
+
+double halfAwayFromZero(double value, int decimals)
+{
+    if (!std::isfinite(value))
+        return value;
+    const double scaled = scaledThroughText(value, decimals);
+    const double rounded = std::round(scaled) / std::pow(10.0, decimals);
+    return rounded == 0.0 ? 0.0 : rounded;
+}
+
+double halfToEven(double value, int decimals)
+{
+    if (!std::isfinite(value))
+        return value;
+    const double scaled = scaledThroughText(value, decimals);
+    const double rounded = std::nearbyint(scaled) / std::pow(10.0, decimals);
+    return rounded == 0.0 ? 0.0 : rounded;
+}
+
+} // namespace Rounding

@@ -1,0 +1,91 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "kpievaluation.h"
+
+#include "app/numberformat.h"
+#include "engine/perioddataset.h"
+#include "engine/rounding.h"
+
+using namespace Qt::StringLiterals;
+
+namespace KpiEvaluation {
+
+namespace {
+
+double elementNumber(QString element, QChar marker, const NumberFormat &numbers)
+{
+    return numbers.toNumber(element.remove(marker));
+}
+
+double oneDecimal(double value)
+{
+    return Rounding::halfAwayFromZero(value, 1);
+}
+
+QString plainNumber(double value, const NumberFormat &numbers)
+{
+    return numbers.locale().toString(value, 'g', QLocale::FloatingPointShortest);
+}
+
+} // namespace
+
+Result evaluateBenchmark(const QString &benchmark, double actual, const NumberFormat &numbers,
+                         Result result)
+{
+    const QStringList elements = benchmark.split(u',');
+    if (actual == 0.0 || benchmark.isEmpty())
+        return result;
+
+    const QString &first = elements.first();
+    if (first.contains(u'<')) {
+        result.optimal = elementNumber(first, u'<', numbers);
+        result.variant = oneDecimal(result.optimal - actual);
+        result.optimalType = AtMost;
+    } else if (first.contains(u'>')) {
+        result.optimal = elementNumber(first, u'>', numbers);
+        result.variant = oneDecimal(actual - result.optimal);
+        result.optimalType = AtLeast;
+    }
+    const double firstVariant = result.variant;
+
+    double variant = firstVariant;
+    if (firstVariant < 0 && elements.size() > 1) {
+        const QString &second = elements.at(1);
+        if (second.contains(u'<'))
+            variant = oneDecimal(actual - elementNumber(second, u'<', numbers));
+        else if (second.contains(u'>'))
+            variant = oneDecimal(elementNumber(second, u'>', numbers) - actual);
+    }
+    result.band = firstVariant >= 0 ? Green : (variant >= 0 ? Yellow : Red);
+    result.variant = firstVariant;
+    return result;
+}
+
+QString valueCellText(int type, qint64 fieldId, const PeriodDataSet &data,
+                      const NumberFormat &numbers)
+{
+    if (type == 1)
+        return {};
+    const int pos = PeriodDataSet::findFieldPos(data.current().fieldIds, fieldId);
+    const QString magnitude = pos > 0 ? data.current().fieldAbs.value(pos - 1) : QString();
+    switch (type) {
+    case 3:
+        if (numbers.toNumber(magnitude) != 0.0)
+            return plainNumber(data.getFieldValue(fieldId), numbers) + u'%';
+        return magnitude;
+    case 4:
+        return magnitude.isEmpty() ? QString() : plainNumber(numbers.toNumber(magnitude), numbers);
+    default:
+        // Amounts show their size; the sign is told by colour.
+        return numbers.formatMoney(magnitude.isEmpty() ? QVariant(QString())
+                                                       : QVariant(data.getFieldAbs(fieldId)));
+    }
+}
+
+QString benchmarkCellText(const QString &benchmark)
+{
+    if (benchmark.isEmpty())
+        return benchmark;
+    return benchmark.split(u',').first() + u'%';
+}
+
+} // namespace KpiEvaluation
