@@ -30,8 +30,8 @@ const QList<Verb> &verbs()
          PasswordVerbs::encryptPassword},
         {u"decrypt-password"_s, u"STORED"_s, u"print the password a stored value holds"_s,
          PasswordVerbs::decryptPassword},
-        {u"make-demo"_s, u"DIR [--use]"_s, u"write a demo workspace (database, company file, settings)"_s,
-         DemoVerb::makeDemo},
+        {u"make-demo"_s, u"DIR [--use]"_s,
+         u"write a demo workspace (database, company file, settings)"_s, DemoVerb::makeDemo},
         {u"produce"_s,
          u"--from YYYY-MM --to YYYY-MM --user NAME --password PW [--settings FILE] "
          u"[--compare years|periods --count N] [--format csv|json]"_s,

@@ -24,8 +24,8 @@ namespace ProduceVerb {
 
 namespace {
 
-const QStringList Columns = {u"slot"_s,  u"id"_s,      u"tab"_s,       u"order"_s,
-                             u"label"_s, u"type"_s,    u"display"_s,   u"signed"_s,
+const QStringList Columns = {u"slot"_s,  u"id"_s,        u"tab"_s,     u"order"_s,
+                             u"label"_s, u"type"_s,      u"display"_s, u"signed"_s,
                              u"abs"_s,   u"benchmark"_s, u"variant"_s, u"band"_s};
 
 int usageError(const QString &problem)
@@ -51,8 +51,8 @@ QString numberText(double value)
 
 QString csvField(const QString &text)
 {
-    if (!text.contains(u',') && !text.contains(u'"') && !text.contains(u'\n')
-        && !text.contains(u'\r'))
+    if (!text.contains(u',') && !text.contains(u'"') && !text.contains(u'\n') &&
+        !text.contains(u'\r'))
         return text;
     return u'"' + QString(text).replace(u"\""_s, u"\"\""_s) + u'"';
 }
@@ -77,8 +77,8 @@ QList<Record> recordsOfSlot(AppContext &context, int slot)
         QString benchmark, variant, band;
         const double actual = data.getFieldValue(id);
         if (type == 3 && actual != 0.0) {
-            const auto result = KpiEvaluation::evaluateBenchmark(
-                fields.value(u"Data"_s).toString(), actual, numbers);
+            const auto result = KpiEvaluation::evaluateBenchmark(fields.value(u"Data"_s).toString(),
+                                                                 actual, numbers);
             benchmark = numberText(result.optimal);
             variant = numberText(result.variant);
             band = QString::number(result.band);
@@ -177,8 +177,7 @@ int produce(const QStringList &arguments)
     }
     context.loginState() = *login;
 
-    const ProduceCommand::Selection selection{from->month(), from->year(), to->month(),
-                                              to->year()};
+    const ProduceCommand::Selection selection{from->month(), from->year(), to->month(), to->year()};
     if (ProduceCommand(context).produce(selection) != ProduceCommand::Outcome::Produced) {
         disconnectMainDatabase(context);
         return 2;
@@ -187,8 +186,8 @@ int produce(const QStringList &arguments)
     QList<Record> records = recordsOfSlot(context, 0);
     if (compareKind) {
         PeriodDataSet &data = context.periodDataSet();
-        const auto ranges = ComparisonRanges::earlierRanges(data.range(0), *compareKind,
-                                                            compareCount);
+        const auto ranges =
+            ComparisonRanges::earlierRanges(data.range(0), *compareKind, compareCount);
         for (int slot = 1; slot <= ranges.size(); ++slot) {
             data.setRange(slot, ranges[slot - 1]);
             data.setCurrentSlot(quint8(slot));

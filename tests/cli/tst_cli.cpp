@@ -2,7 +2,16 @@
 #include "app/settings.h"
 #include "cipher/passwordcipher.h"
 
+#include "database/sqliteconnection.h"
+#include "sources/companyfile.h"
+
+#include <QCryptographicHash>
+#include <QJsonArray>
+#include <QJsonDocument>
+#include <QJsonObject>
 #include <QProcess>
+#include <QSqlQuery>
+#include <QTemporaryDir>
 #include <QTest>
 
 using namespace Qt::StringLiterals;
@@ -16,12 +25,23 @@ struct Run
     QString err;
 };
 
+// Keeps the tool's per-user files (settings, data folder) inside the test.
+QTemporaryDir &home()
+{
+    static QTemporaryDir dir;
+    return dir;
+}
+
 Run runCli(const QStringList &arguments)
 {
     QProcess process;
+    QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
+    environment.insert(u"XDG_CONFIG_HOME"_s, home().filePath(u"config"_s));
+    environment.insert(u"XDG_DATA_HOME"_s, home().filePath(u"data"_s));
+    process.setProcessEnvironment(environment);
     process.start(QStringLiteral(VELTRIX_CLI), arguments);
     Run run;
-    if (!process.waitForFinished(30000))
+    if (!process.waitForFinished(120000))
         return run;
     run.exitCode = process.exitCode();
     run.out = QString::fromUtf8(process.readAllStandardOutput());
@@ -42,7 +62,154 @@ private Q_SLOTS:
     void undecipherableValueFails();
     void badUsage_data();
     void badUsage();
+    void demoIsTheSameEveryTime();
+    void produceCsv();
+    void produceJsonWithComparison();
+    void produceRespectsTheUsersLines();
+    void produceRefuses_data();
+    void produceRefuses();
+
+private:
+    QString demoFolder();
+    QStringList produce(const QStringList &extra, int expectedExit = 0);
+
+    QTemporaryDir m_dir;
+    bool m_demoMade = false;
 };
+
+QString TestCli::demoFolder()
+{
+    const QString folder = m_dir.filePath(u"demo"_s);
+    if (!m_demoMade) {
+        const Run run = runCli({u"make-demo"_s, folder});
+        m_demoMade = run.exitCode == 0;
+    }
+    return folder;
+}
+
+QStringList TestCli::produce(const QStringList &extra, int expectedExit)
+{
+    const Run run = runCli(
+        QStringList{u"produce"_s, u"--settings"_s, demoFolder() + u"/settings.ini"_s} + extra);
+    if (run.exitCode != expectedExit)
+        qWarning().noquote() << run.err;
+    return run.exitCode == expectedExit ? run.out.split(u'\n', Qt::SkipEmptyParts)
+                                        : QStringList{u"exit %1"_s.arg(run.exitCode)};
+}
+
+namespace {
+
+QByteArray journalDigest(const QString &companyFile)
+{
+    SqliteConnection connection;
+    if (CompanyFile::open(connection, companyFile))
+        return {};
+    QSqlQuery query(connection.database());
+    query.exec(
+        u"SELECT a.AccountNumber, j.TransactionDate, j.TaxExclusiveAmount, j.Memo "
+        u"FROM JournalRecords j JOIN Accounts a USING (AccountID) ORDER BY j.JournalRecordID"_s);
+    QCryptographicHash hash(QCryptographicHash::Sha256);
+    int rows = 0;
+    while (query.next()) {
+        for (int i = 0; i < 4; ++i)
+            hash.addData(query.value(i).toString().toUtf8() + '\t');
+        ++rows;
+    }
+    return rows > 10000 ? hash.result().toHex() : QByteArray();
+}
+
+} // namespace
+
+void TestCli::demoIsTheSameEveryTime()
+{
+    const QString again = m_dir.filePath(u"demo-again"_s);
+    QCOMPARE(runCli({u"make-demo"_s, again}).exitCode, 0);
+    const QString name = u"/Harbour Panel & Paint.myo"_s;
+    const QByteArray first = journalDigest(demoFolder() + name);
+    QVERIFY(!first.isEmpty());
+    QCOMPARE(journalDigest(again + name), first);
+}
+
+void TestCli::produceCsv()
+{
+    const QStringList lines = produce({u"--from"_s, u"2025-07"_s, u"--to"_s, u"2026-06"_s,
+                                       u"--user"_s, u"manager"_s, u"--password"_s, u"manager1"_s});
+    QCOMPARE(lines.first(),
+             u"slot,id,tab,order,label,type,display,signed,abs,benchmark,variant,band"_s);
+    QCOMPARE(lines.size(), 1 + 123);
+    // Ordered as the "All" tab: by Order, headings included.
+    QVERIFY(lines.at(1).startsWith(u"0,9,1,1010,Key performance indicators,1,"_s));
+    QSet<QString> bands;
+    for (const QString &line : lines.mid(1)) {
+        const QStringList cells = line.split(u',');
+        if (cells.at(5) == u"3"_s)
+            bands << cells.last();
+    }
+    // The demo shows every colour somewhere.
+    QCOMPARE(bands, (QSet<QString>{u"0"_s, u"1"_s, u"2"_s}));
+    // Money with grouping is quoted.
+    QVERIFY(lines.join(u'\n').contains(u",\"$ "_s));
+}
+
+void TestCli::produceJsonWithComparison()
+{
+    const QStringList lines =
+        produce({u"--from"_s, u"2025-01"_s, u"--to"_s, u"2025-03"_s, u"--user"_s, u"manager"_s,
+                 u"--password"_s, u"manager1"_s, u"--compare"_s, u"periods"_s, u"--count"_s, u"2"_s,
+                 u"--format"_s, u"json"_s});
+    const QJsonArray rows = QJsonDocument::fromJson(lines.join(u'\n').toUtf8()).array();
+    QCOMPARE(rows.size(), 3 * 123);
+    QCOMPARE(rows.first().toObject().value(u"slot"_s).toString(), u"0"_s);
+    QCOMPARE(rows.last().toObject().value(u"slot"_s).toString(), u"2"_s);
+    double totalSales[3] = {};
+    for (const QJsonValue &value : rows) {
+        const QJsonObject row = value.toObject();
+        if (row.value(u"id"_s).toString() == u"79"_s)
+            totalSales[row.value(u"slot"_s).toString().toInt()] =
+                row.value(u"signed"_s).toString().toDouble();
+    }
+    QVERIFY(totalSales[0] > 100000.0);
+    QVERIFY(totalSales[1] > 100000.0);
+    QVERIFY(totalSales[0] != totalSales[1]);
+}
+
+void TestCli::produceRespectsTheUsersLines()
+{
+    const QStringList lines = produce({u"--from"_s, u"2025-07"_s, u"--to"_s, u"2025-07"_s,
+                                       u"--user"_s, u"WORKSHOP"_s, u"--password"_s, u"panel1"_s});
+    QSet<QString> tabsWithValues;
+    for (const QString &line : lines.mid(1)) {
+        const QStringList cells = line.split(u',');
+        if (cells.at(5) != u"1"_s)
+            tabsWithValues << cells.at(2);
+    }
+    QCOMPARE(tabsWithValues, (QSet<QString>{u"1"_s, u"2"_s, u"5"_s}));
+}
+
+void TestCli::produceRefuses_data()
+{
+    QTest::addColumn<QStringList>("arguments");
+    QTest::addColumn<QString>("message");
+    QTest::newRow("wrong password")
+        << QStringList{u"--from"_s, u"2025-07"_s, u"--to"_s,       u"2025-07"_s,
+                       u"--user"_s, u"manager"_s, u"--password"_s, u"nope"_s}
+        << u"Login failed! Ensure your username and password are correct!"_s;
+    QTest::newRow("range backwards")
+        << QStringList{u"--from"_s, u"2025-07"_s, u"--to"_s,       u"2025-06"_s,
+                       u"--user"_s, u"sysop"_s,   u"--password"_s, u"sysop"_s}
+        << u"The selected date range is invalid!"_s;
+}
+
+void TestCli::produceRefuses()
+{
+    QFETCH(QStringList, arguments);
+    QFETCH(QString, message);
+    const Run run = runCli(
+        QStringList{u"produce"_s, u"--settings"_s, demoFolder() + u"/settings.ini"_s} + arguments);
+    QCOMPARE(run.exitCode, 2);
+    QVERIFY2(run.err.contains(message), qPrintable(run.err));
+    QCOMPARE(run.out, QString());
+}
 
 void TestCli::passwordRoundTrip_data()
 {

@@ -46,8 +46,8 @@ std::optional<QString> fillMainDatabase(const QString &file)
     QSqlQuery query(database);
 
     query.prepare(u"UPDATE Hours SET Value = ? WHERE ID = ?"_s);
-    for (const auto &[id, rate] : {std::pair{1, DemoCompany::PanelRate},
-                                   std::pair{2, DemoCompany::PaintRate}}) {
+    for (const auto &[id, rate] :
+         {std::pair{1, DemoCompany::PanelRate}, std::pair{2, DemoCompany::PaintRate}}) {
         query.addBindValue(rate);
         query.addBindValue(id);
         if (!query.exec())

@@ -16,8 +16,8 @@ struct DemoUser
 {
     QString name;
     QString password;
-    int type;            // 1 administrator, 0 standard user
-    QList<int> tabs;     // the tabs whose lines the user may see
+    int type;        // 1 administrator, 0 standard user
+    QList<int> tabs; // the tabs whose lines the user may see
 };
 
 QList<DemoUser> users();

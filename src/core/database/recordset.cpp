@@ -70,8 +70,10 @@ std::optional<DbError> RecordSet::open()
         return SqliteConnection::errorFrom(query.lastError());
 
     const QSqlRecord record = query.record();
-    for (int i = 0; i < record.count(); ++i)
+    for (int i = 0; i < record.count(); ++i) {
         m_fields << record.fieldName(i);
+        m_fieldIndex.insert(record.fieldName(i), i);
+    }
     while (query.next()) {
         Row row;
         for (int i = 0; i < m_fields.size(); ++i)
@@ -91,6 +93,7 @@ void RecordSet::close()
 {
     m_open = false;
     m_fields.clear();
+    m_fieldIndex.clear();
     m_rows.clear();
     m_position = -1;
 }
@@ -234,6 +237,9 @@ std::optional<DbError> RecordSet::deleteCurrent()
 
 int RecordSet::fieldIndex(const QString &name) const
 {
+    // Callers mostly spell a column as the table does; only the others need the slow search.
+    if (const auto exact = m_fieldIndex.constFind(name); exact != m_fieldIndex.cend())
+        return exact.value();
     for (int i = 0; i < m_fields.size(); ++i) {
         if (m_fields[i].compare(name, Qt::CaseInsensitive) == 0)
             return i;

@@ -3,6 +3,7 @@
 
 #include "dberror.h"
 
+#include <QHash>
 #include <QList>
 #include <QSqlDatabase>
 #include <QString>
@@ -83,6 +84,7 @@ private:
     QVariantList m_bindings;
     QString m_table;
     QStringList m_fields;
+    QHash<QString, int> m_fieldIndex; // by the names as the query gave them
     QList<Row> m_rows;
     int m_position = -1;
     bool m_open = false;

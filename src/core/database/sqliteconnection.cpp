@@ -77,10 +77,10 @@ std::optional<DbError> SqliteConnection::open(const QString &file, Mode mode,
 
     // The first statements touch the file: a file that is not a database fails here.
     QSqlQuery query(database);
-    const QStringList pragmas = mode == Mode::ReadOnly
-                                    ? QStringList{u"PRAGMA schema_version"_s}
-                                    : QStringList{u"PRAGMA journal_mode=DELETE"_s,
-                                                  u"PRAGMA foreign_keys=ON"_s};
+    const QStringList pragmas =
+        mode == Mode::ReadOnly
+            ? QStringList{u"PRAGMA schema_version"_s}
+            : QStringList{u"PRAGMA journal_mode=DELETE"_s, u"PRAGMA foreign_keys=ON"_s};
     for (const QString &pragma : pragmas) {
         if (!query.exec(pragma)) {
             const DbError error = errorFrom(query.lastError());

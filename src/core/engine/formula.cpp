@@ -9,8 +9,21 @@ using namespace Qt::StringLiterals;
 
 struct Formula::Node
 {
-    enum class Kind { Number, Value, Magnitude, Sum, Rate, DaySpan, WorkingDays, Jobs,
-                      Add, Subtract, Multiply, Divide, Negate };
+    enum class Kind {
+        Number,
+        Value,
+        Magnitude,
+        Sum,
+        Rate,
+        DaySpan,
+        WorkingDays,
+        Jobs,
+        Add,
+        Subtract,
+        Multiply,
+        Divide,
+        Negate
+    };
     Kind kind = Kind::Number;
     double number = 0.0;
     int first = 0;
@@ -32,7 +45,9 @@ using NodePtr = std::shared_ptr<const Node>;
 class Parser
 {
 public:
-    explicit Parser(const QString &text) : m_text(text) {}
+    explicit Parser(const QString &text)
+        : m_text(text)
+    {}
 
     NodePtr parse()
     {
@@ -140,8 +155,8 @@ private:
         const QChar c = m_text.at(m_position);
         if (c.isDigit()) {
             const qsizetype start = m_position;
-            while (m_position < m_text.size()
-                   && (m_text.at(m_position).isDigit() || m_text.at(m_position) == u'.'))
+            while (m_position < m_text.size() &&
+                   (m_text.at(m_position).isDigit() || m_text.at(m_position) == u'.'))
                 ++m_position;
             bool ok = false;
             auto node = std::make_shared<Node>();
@@ -151,14 +166,29 @@ private:
         ++m_position;
         auto node = std::make_shared<Node>();
         switch (c.unicode()) {
-        case u'D': node->kind = Node::Kind::DaySpan; return node;
-        case u'W': node->kind = Node::Kind::WorkingDays; return node;
-        case u'J': node->kind = Node::Kind::Jobs; return node;
-        case u'V': node->kind = Node::Kind::Value; break;
-        case u'A': node->kind = Node::Kind::Magnitude; break;
-        case u'H': node->kind = Node::Kind::Rate; break;
-        case u'S': node->kind = Node::Kind::Sum; break;
-        default: return fail(u"unknown term"_s);
+        case u'D':
+            node->kind = Node::Kind::DaySpan;
+            return node;
+        case u'W':
+            node->kind = Node::Kind::WorkingDays;
+            return node;
+        case u'J':
+            node->kind = Node::Kind::Jobs;
+            return node;
+        case u'V':
+            node->kind = Node::Kind::Value;
+            break;
+        case u'A':
+            node->kind = Node::Kind::Magnitude;
+            break;
+        case u'H':
+            node->kind = Node::Kind::Rate;
+            break;
+        case u'S':
+            node->kind = Node::Kind::Sum;
+            break;
+        default:
+            return fail(u"unknown term"_s);
         }
         if (!take(u'['))
             return fail(u"missing \"[\""_s);
@@ -193,19 +223,28 @@ std::optional<double> evaluateNode(const Node &node, const Formula::Inputs &in)
 {
     using Kind = Node::Kind;
     switch (node.kind) {
-    case Kind::Number: return node.number;
-    case Kind::Value: return in.value(node.first);
-    case Kind::Magnitude: return in.magnitude(node.first);
-    case Kind::Sum: return in.sum(node.first, node.last);
-    case Kind::Rate: return in.hourlyRate(node.first);
-    case Kind::DaySpan: return double(in.daySpan);
-    case Kind::WorkingDays: return double(in.workingDays);
-    case Kind::Jobs: return double(in.jobs);
+    case Kind::Number:
+        return node.number;
+    case Kind::Value:
+        return in.value(node.first);
+    case Kind::Magnitude:
+        return in.magnitude(node.first);
+    case Kind::Sum:
+        return in.sum(node.first, node.last);
+    case Kind::Rate:
+        return in.hourlyRate(node.first);
+    case Kind::DaySpan:
+        return double(in.daySpan);
+    case Kind::WorkingDays:
+        return double(in.workingDays);
+    case Kind::Jobs:
+        return double(in.jobs);
     case Kind::Negate: {
         const auto operand = evaluateNode(*node.left, in);
         return operand ? std::optional<double>(-*operand) : std::nullopt;
     }
-    default: break;
+    default:
+        break;
     }
     const auto left = evaluateNode(*node.left, in);
     if (!left)
@@ -214,15 +253,19 @@ std::optional<double> evaluateNode(const Node &node, const Formula::Inputs &in)
     if (!right)
         return std::nullopt;
     switch (node.kind) {
-    case Kind::Add: return finite(*left + *right);
-    case Kind::Subtract: return finite(*left - *right);
-    case Kind::Multiply: return finite(*left * *right);
+    case Kind::Add:
+        return finite(*left + *right);
+    case Kind::Subtract:
+        return finite(*left - *right);
+    case Kind::Multiply:
+        return finite(*left * *right);
     case Kind::Divide:
         // 0 / 0 fails as well: a ratio of nothing to nothing is not 0 %.
         if (*right == 0.0)
             return std::nullopt;
         return finite(*left / *right);
-    default: return std::nullopt;
+    default:
+        return std::nullopt;
     }
 }
 

@@ -19,13 +19,13 @@ class Formula
 public:
     struct Inputs
     {
-        std::function<double(int)> value;          // V[n]
-        std::function<double(int)> magnitude;      // A[n]
-        std::function<double(int, int)> sum;       // S[a..b]
-        std::function<double(int)> hourlyRate;     // H[n]
-        int daySpan = 0;                           // D
-        int workingDays = 0;                       // W
-        int jobs = 0;                              // J
+        std::function<double(int)> value;      // V[n]
+        std::function<double(int)> magnitude;  // A[n]
+        std::function<double(int, int)> sum;   // S[a..b]
+        std::function<double(int)> hourlyRate; // H[n]
+        int daySpan = 0;                       // D
+        int workingDays = 0;                   // W
+        int jobs = 0;                          // J
     };
 
     // Nothing when the text is not a formula of this form; the description says where.

@@ -14,7 +14,7 @@ struct Step
     int number;
     int field;
     Formula formula;
-    int typeCode;   // the storage rounding of the period data set
+    int typeCode; // the storage rounding of the period data set
 };
 
 const QList<Step> &steps();

@@ -21,33 +21,92 @@ void PeriodDataSet::setCurrentSlot(quint8 slot)
     m_current = slot < SlotCount ? slot : 0;
 }
 
+namespace {
+
+// Whether the text is an integer written the way QString::number writes one; such a text
+// equals another number numerically only when it equals its text.
+bool isCanonicalInteger(const QString &text)
+{
+    const qsizetype start = text.startsWith(u'-') ? 1 : 0;
+    if (text.size() == start || (text.size() > start + 1 && text.at(start) == u'0'))
+        return false;
+    for (qsizetype i = start; i < text.size(); ++i) {
+        if (!text.at(i).isDigit())
+            return false;
+    }
+    return true;
+}
+
+} // namespace
+
 int PeriodDataSet::findFieldPos(const QStringList &ids, qint64 id)
 {
+    const QString idText = QString::number(id);
     for (int i = 0; i < ids.size(); ++i) {
+        const QString &text = ids[i];
+        if (text == idText)
+            return i + 1;
+        if (isCanonicalInteger(text))
+            continue;
         bool ok = false;
-        const double number = ids[i].trimmed().toDouble(&ok);
+        const double number = text.trimmed().toDouble(&ok);
         if (ok && number == double(id))
             return i + 1;
     }
     return 0;
 }
 
+int PeriodDataSet::Slot::findFieldPos(qint64 id) const
+{
+    if (m_indexed > fieldIds.size() || m_numbers.size() > fieldIds.size()) {
+        m_firstPosition.clear();
+        m_numbers.clear();
+        m_indexed = 0;
+        m_irregular = false;
+    }
+    for (; m_indexed < fieldIds.size() && !m_irregular; ++m_indexed) {
+        const QString &text = fieldIds.at(m_indexed);
+        if (!isCanonicalInteger(text)) {
+            m_irregular = true;
+            break;
+        }
+        const qint64 entryId = text.toLongLong();
+        if (!m_firstPosition.contains(entryId))
+            m_firstPosition.insert(entryId, m_indexed + 1);
+    }
+    if (m_irregular)
+        return PeriodDataSet::findFieldPos(fieldIds, id);
+    return m_firstPosition.value(id, 0);
+}
+
 double PeriodDataSet::getFieldValue(qint64 id) const
 {
     const Slot &slot = current();
-    const int pos = findFieldPos(slot.fieldIds, id);
+    const int pos = slot.findFieldPos(id);
     if (pos == 0)
         return 0.0;
-    const double value = readNumber(slot.fieldValues.value(pos - 1));
-    const bool accountFigure = slot.fieldTypes.value(pos - 1).trimmed() == u"2"_s;
-    return accountFigure ? -value : value;
+    const Slot::Numbers &numbers = numbersAt(slot, pos);
+    return numbers.accountFigure ? -numbers.value : numbers.value;
+}
+
+const PeriodDataSet::Slot::Numbers &PeriodDataSet::numbersAt(const Slot &slot, int pos) const
+{
+    // The texts are read once; reading them again for every formula would cost more than
+    // everything else a load does outside the accounting queries.
+    while (slot.m_numbers.size() < pos) {
+        const int i = int(slot.m_numbers.size());
+        slot.m_numbers.append({readNumber(slot.fieldValues.value(i)),
+                               readNumber(slot.fieldAbs.value(i)),
+                               slot.fieldTypes.value(i).trimmed() == u"2"_s});
+    }
+    return slot.m_numbers.at(pos - 1);
 }
 
 double PeriodDataSet::getFieldAbs(qint64 id) const
 {
     const Slot &slot = current();
-    const int pos = findFieldPos(slot.fieldIds, id);
-    return pos == 0 ? 0.0 : readNumber(slot.fieldAbs.value(pos - 1));
+    const int pos = slot.findFieldPos(id);
+    return pos == 0 ? 0.0 : numbersAt(slot, pos).magnitude;
 }
 
 double PeriodDataSet::sumFieldValues(qint64 first, qint64 last) const
@@ -69,16 +128,18 @@ void PeriodDataSet::storeFieldValue(qint64 id, double value, int typeCode)
         return;
     }
     const double rounded = roundForStorage(value, typeCode);
-    slot.fieldValues << numberText(rounded);
-    slot.fieldAbs << numberText(std::fabs(rounded));
+    const QString text = numberText(rounded);
+    slot.fieldValues << text;
+    slot.fieldAbs << (text.startsWith(u'-') ? text.sliced(1) : text);
 }
 
 void PeriodDataSet::storeAccountFigure(qint64 id, double total, int fieldType)
 {
     Slot &slot = current();
     slot.fieldIds << QString::number(id);
-    slot.fieldAbs << numberText(std::fabs(total));
-    slot.fieldValues << numberText(total);
+    const QString text = numberText(total);
+    slot.fieldAbs << (text.startsWith(u'-') ? text.sliced(1) : text);
+    slot.fieldValues << text;
     slot.fieldTypes << QString::number(fieldType);
 }
 
@@ -152,8 +213,10 @@ double PeriodDataSet::readNumber(const QString &text) const
 {
     // Figures are written in one region-independent form; anything else (a hand-edited cache)
     // is read the way the user's region writes numbers.
+    if (text.isEmpty())
+        return 0.0;
     bool ok = false;
-    const double number = QLocale::c().toDouble(text.trimmed(), &ok);
+    const double number = text.toDouble(&ok);
     if (ok && std::isfinite(number))
         return number;
     return m_numberFormat.toNumber(text);

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <QDate>
+#include <QHash>
 #include <QString>
 #include <QStringList>
 
@@ -37,6 +38,25 @@ public:
 
         int size() const { return int(fieldIds.size()); }
         bool isEmpty() const { return fieldIds.isEmpty(); }
+
+        // Position (from 1) of the first entry of the ID; 0 when there is none.
+        int findFieldPos(qint64 id) const;
+
+    private:
+        friend class PeriodDataSet;
+        struct Numbers
+        {
+            double value;
+            double magnitude;
+            bool accountFigure;
+        };
+
+        // Entries are only ever appended, so the first position of each ID is remembered as
+        // the list grows; a formula reads hundreds of figures per load.
+        mutable QHash<qint64, int> m_firstPosition;
+        mutable int m_indexed = 0;
+        mutable bool m_irregular = false; // an ID not written as a plain integer
+        mutable QList<Numbers> m_numbers; // the texts read as numbers, entry by entry
     };
 
     struct Range
@@ -82,6 +102,7 @@ public:
 
 private:
     double readNumber(const QString &text) const;
+    const Slot::Numbers &numbersAt(const Slot &slot, int pos) const;
 
     const NumberFormat &m_numberFormat;
     std::array<Slot, SlotCount> m_slots;

@@ -11,7 +11,9 @@
 
 using namespace Qt::StringLiterals;
 
-ProduceCommand::ProduceCommand(AppContext &context) : m_context(context) {}
+ProduceCommand::ProduceCommand(AppContext &context)
+    : m_context(context)
+{}
 
 QDate ProduceCommand::rangeStart(const Selection &selection)
 {
@@ -32,8 +34,9 @@ ProduceCommand::Outcome ProduceCommand::produce(const Selection &selection)
     AccountingSource *source = m_context.accountingSource();
     if (!source) {
         ErrorReporter(m_context.prompter())
-            .reportError(429, u"The accounting package \""_s + settings.accPackage
-                                  + u"\" cannot be read by this copy of Veltrix."_s,
+            .reportError(429,
+                         u"The accounting package \""_s + settings.accPackage +
+                             u"\" cannot be read by this copy of Veltrix."_s,
                          u"Produce"_s);
         return Outcome::Failed;
     }
@@ -41,9 +44,9 @@ ProduceCommand::Outcome ProduceCommand::produce(const Selection &selection)
     const bool sourceMissing = !source->isReachable();
     if (settings.accFilePath.isEmpty() && sourceMissing) {
         m_context.prompter().message(
-            u"There is no running instance of "_s + settings.accPackage
-                + u" and your primary Account data file has not been specified!\r\n\r\n"_s
-                + u"You can specify your primary Accounting file in the System Configuration."_s,
+            u"There is no running instance of "_s + settings.accPackage +
+                u" and your primary Account data file has not been specified!\r\n\r\n"_s +
+                u"You can specify your primary Accounting file in the System Configuration."_s,
             u"Cannot Produce KPI's"_s, Prompter::Icon::Exclamation);
         return Outcome::NoSource;
     }

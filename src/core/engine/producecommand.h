@@ -13,7 +13,7 @@ class ProduceCommand
 public:
     struct Selection
     {
-        int firstMonth = 1;   // 1 to 12
+        int firstMonth = 1; // 1 to 12
         int firstYear = 0;
         int lastMonth = 1;
         int lastYear = 0;

@@ -11,7 +11,9 @@
 
 using namespace Qt::StringLiterals;
 
-RangeLoader::RangeLoader(AppContext &context) : m_context(context) {}
+RangeLoader::RangeLoader(AppContext &context)
+    : m_context(context)
+{}
 
 int RangeLoader::workingDays(const QDate &start, const QDate &end)
 {
@@ -64,10 +66,10 @@ bool RangeLoader::outOfRange(const QDate &start, const QDate &end)
     const auto shortDate = [&](const QDate &date) {
         return date.isValid() ? locale.toString(date, QLocale::ShortFormat) : QString();
     };
-    m_context.prompter().message(u"The selected date range "_s + shortDate(start) + u" to "_s
-                                     + shortDate(end) + u" exceeds the\r\naccounting period of "_s
-                                     + u"your MoneyWorks file which ends "_s
-                                     + shortDate(*periodEnd) + u"!"_s,
+    m_context.prompter().message(u"The selected date range "_s + shortDate(start) + u" to "_s +
+                                     shortDate(end) + u" exceeds the\r\naccounting period of "_s +
+                                     u"your MoneyWorks file which ends "_s + shortDate(*periodEnd) +
+                                     u"!"_s,
                                  u"Data Out Of Range"_s, Prompter::Icon::Exclamation);
     return true;
 }

@@ -14,6 +14,12 @@ namespace {
 // digits are what a double holds reliably; more would bring the binary error back.
 double scaledThroughText(double value, int decimals)
 {
+    // Only a value that lands next to a half needs its decimal text; elsewhere the binary
+    // error cannot change which way it rounds.
+    const double scaled = value * std::pow(10.0, decimals);
+    const double fraction = std::fabs(scaled - std::trunc(scaled));
+    if (std::fabs(fraction - 0.5) > 1e-6 && std::fabs(scaled) < 1e15)
+        return scaled;
     const QByteArray text = QByteArray::number(value, 'g', 15) + 'e' + QByteArray::number(decimals);
     return text.toDouble();
 }

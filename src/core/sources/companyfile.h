@@ -32,6 +32,9 @@ int compareMyobDates(QByteArrayView left, QByteArrayView right);
 // The date as YYYYMMDD, or 0 when the text is neither date form.
 int dateKey(QByteArrayView text);
 
+// The page cache of a company file connection.
+inline constexpr int PageCacheKiB = 65536;
+
 // Opens a company file read-only with the collation in place.
 std::optional<DbError> open(SqliteConnection &connection, const QString &path);
 

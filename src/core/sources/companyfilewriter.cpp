@@ -25,9 +25,8 @@ CompanyFileWriter::~CompanyFileWriter()
 
 std::optional<QString> CompanyFileWriter::failure(const char *what)
 {
-    const QString problem =
-        u"%1: %2"_s.arg(QLatin1StringView(what),
-                        QString::fromUtf8(m_db ? sqlite3_errmsg(m_db) : "out of memory"));
+    const QString problem = u"%1: %2"_s.arg(
+        QLatin1StringView(what), QString::fromUtf8(m_db ? sqlite3_errmsg(m_db) : "out of memory"));
     close();
     return problem;
 }
@@ -41,20 +40,19 @@ std::optional<QString> CompanyFileWriter::create(const QString &path)
         return failure("cannot create the company file");
     CompanyFile::registerMyobDate(m_db);
     const QByteArray schema = CompanyFile::schemaSql().toUtf8();
-    if (sqlite3_exec(m_db, "PRAGMA journal_mode=DELETE; PRAGMA synchronous=OFF;", nullptr,
-                     nullptr, nullptr) != SQLITE_OK
-        || sqlite3_exec(m_db, schema.constData(), nullptr, nullptr, nullptr) != SQLITE_OK
-        || sqlite3_exec(m_db, "BEGIN", nullptr, nullptr, nullptr) != SQLITE_OK)
+    if (sqlite3_exec(m_db, "PRAGMA journal_mode=DELETE; PRAGMA synchronous=OFF;", nullptr, nullptr,
+                     nullptr) != SQLITE_OK ||
+        sqlite3_exec(m_db, schema.constData(), nullptr, nullptr, nullptr) != SQLITE_OK ||
+        sqlite3_exec(m_db, "BEGIN", nullptr, nullptr, nullptr) != SQLITE_OK)
         return failure("cannot lay out the company file");
-    if (sqlite3_prepare_v2(m_db,
-                           "INSERT INTO Accounts (AccountNumber, AccountName) VALUES (?, ?)", -1,
-                           &m_account, nullptr) != SQLITE_OK
-        || sqlite3_prepare_v2(m_db,
-                              "INSERT INTO JournalRecords (AccountID, TransactionDate, "
-                              "TaxExclusiveAmount, Memo) VALUES (?, ?, ?, ?)",
-                              -1, &m_journal, nullptr) != SQLITE_OK
-        || sqlite3_prepare_v2(m_db, "INSERT INTO Sales (Date, InvoiceNumber) VALUES (?, ?)", -1,
-                              &m_sale, nullptr) != SQLITE_OK)
+    if (sqlite3_prepare_v2(m_db, "INSERT INTO Accounts (AccountNumber, AccountName) VALUES (?, ?)",
+                           -1, &m_account, nullptr) != SQLITE_OK ||
+        sqlite3_prepare_v2(m_db,
+                           "INSERT INTO JournalRecords (AccountID, TransactionDate, "
+                           "TaxExclusiveAmount, Memo) VALUES (?, ?, ?, ?)",
+                           -1, &m_journal, nullptr) != SQLITE_OK ||
+        sqlite3_prepare_v2(m_db, "INSERT INTO Sales (Date, InvoiceNumber) VALUES (?, ?)", -1,
+                           &m_sale, nullptr) != SQLITE_OK)
         return failure("cannot prepare the company file");
     return std::nullopt;
 }

@@ -17,7 +17,9 @@ namespace {
 class Random
 {
 public:
-    explicit Random(quint64 seed) : m_state(seed) {}
+    explicit Random(quint64 seed)
+        : m_state(seed)
+    {}
 
     quint64 next()
     {
@@ -125,7 +127,7 @@ private:
     double activity(const QDate &day) const
     {
         static constexpr double Season[] = {0.80, 0.92, 1.0, 0.98, 1.04, 1.14,
-                                            1.18, 1.12, 1.0, 0.97, 1.0, 1.08};
+                                            1.18, 1.12, 1.0, 0.97, 1.0,  1.08};
         const double years = m_options.first.daysTo(day) / 365.25;
         double level = std::pow(1.06, years) * Season[day.month() - 1];
         if (day.year() == m_options.badYear)
@@ -186,8 +188,8 @@ private:
             const char *account;
             double amount;
         };
-        const Line lines[] = {{"4-1100", panel},   {"4-1200", paint},  {"4-1300", materials},
-                              {"4-1400", parts},   {"4-1500", sublet}, {"4-1600", towing},
+        const Line lines[] = {{"4-1100", panel}, {"4-1200", paint},  {"4-1300", materials},
+                              {"4-1400", parts}, {"4-1500", sublet}, {"4-1600", towing},
                               {"4-1700", other}};
         double debtor = 0.0;
         for (const Line &line : lines) {
@@ -218,9 +220,10 @@ private:
     void payday(const QDate &day)
     {
         const double inflation = wageInflation(day);
-        const double panelWages = panelBeaters(day) * 38.0 * 41.0 * inflation * m_random.around(0.03);
+        const double panelWages =
+            panelBeaters(day) * 38.0 * 41.0 * inflation * m_random.around(0.03);
         const double paintWages = painters(day) * 38.0 * 43.5 * inflation * m_random.around(0.03);
-        const double officeWages = 3 * 38.0 * 36.0 * inflation;
+        const double officeWages = 3 * 38.0 * 40.0 * inflation;
         const double superannuation = (panelWages + paintWages + officeWages) * 0.11;
         const struct
         {
@@ -257,7 +260,7 @@ private:
 
     void monthEnd(const QDate &day)
     {
-        purchase("5-2300", day, 1250.0 * m_random.around(0.25) * activity(day), u"Booth gas"_s);
+        purchase("5-2300", day, 1900.0 * m_random.around(0.25) * activity(day), u"Booth gas"_s);
         purchase("6-9000", day, 540.0 * m_random.around(0.4), u"Sundries"_s);
         if (m_random.chance(0.35))
             purchase("5-4100", day, 900.0 * m_random.around(0.6), u"Rework"_s);

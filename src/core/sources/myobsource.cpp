@@ -12,6 +12,8 @@
 #include <QSqlError>
 #include <QSqlQuery>
 
+#include <sqlite3.h>
+
 using namespace Qt::StringLiterals;
 
 namespace {
@@ -22,6 +24,16 @@ QString nextOdbcName()
 {
     static QAtomicInt counter;
     return u"veltrix-myob-odbc-%1"_s.arg(counter.fetchAndAddRelaxed(1));
+}
+
+DbError closedConnection()
+{
+    return {DbError::RecordsetClosed, u"Operation is not allowed when the object is closed."_s};
+}
+
+DbError engineError(sqlite3 *handle)
+{
+    return {sqlite3_errcode(handle) & 0xFF, QString::fromUtf8(sqlite3_errmsg(handle))};
 }
 
 // Runs one of the fixed texts; the result is positioned on its first row when it has one.
@@ -47,8 +59,8 @@ MyobSource::~MyobSource()
 
 QString MyobSource::connectionText(const Settings &settings)
 {
-    return u"Driver={"_s + settings.accFileDriver + u"}; TYPE=MYOB; UID="_s + settings.accFileUser
-           + u"; PWD="_s + settings.accFilePass + u"; DATABASE="_s + settings.accFilePath + u";"_s;
+    return u"Driver={"_s + settings.accFileDriver + u"}; TYPE=MYOB; UID="_s + settings.accFileUser +
+           u"; PWD="_s + settings.accFilePass + u"; DATABASE="_s + settings.accFilePath + u";"_s;
 }
 
 bool MyobSource::usesBuiltInEngine(const Settings &settings)
@@ -79,6 +91,11 @@ std::optional<DbError> MyobSource::openDataFile()
 {
     disconnect();
     if (usesBuiltInEngine(m_settings)) {
+        if (!CompanyFile::isCompanyFile(m_settings.accFilePath)) {
+            return DbError{53, u"The company file '"_s + m_settings.accFilePath +
+                                   u"' does not exist, cannot be reached or is not a "
+                                   u"company file."_s};
+        }
         m_companyFile = std::make_unique<SqliteConnection>();
         if (const auto error = CompanyFile::open(*m_companyFile, m_settings.accFilePath)) {
             m_companyFile.reset();
@@ -110,36 +127,115 @@ void MyobSource::disconnect()
     m_odbcName.clear();
 }
 
+MyobSource::FirstRow MyobSource::firstRow(const QString &sql, const QString &column) const
+{
+    // The built-in engine is SQLite itself: ask it directly, without converting every column
+    // of the row on the way.
+    if (sqlite3 *handle = m_companyFile ? m_companyFile->handle() : nullptr) {
+        sqlite3_stmt *statement = nullptr;
+        const QByteArray text = sql.toUtf8();
+        if (sqlite3_prepare_v2(handle, text.constData(), int(text.size()), &statement, nullptr) !=
+            SQLITE_OK) {
+            return {std::nullopt, engineError(handle)};
+        }
+        FirstRow result;
+        const int step = sqlite3_step(statement);
+        if (step == SQLITE_ROW) {
+            for (int i = 0; i < sqlite3_column_count(statement); ++i) {
+                if (column.compare(QLatin1StringView(sqlite3_column_name(statement, i)),
+                                   Qt::CaseInsensitive) != 0)
+                    continue;
+                switch (sqlite3_column_type(statement, i)) {
+                case SQLITE_NULL:
+                    result.value = QVariant();
+                    break;
+                case SQLITE_INTEGER:
+                    result.value = QVariant(qlonglong(sqlite3_column_int64(statement, i)));
+                    break;
+                case SQLITE_FLOAT:
+                    result.value = QVariant(sqlite3_column_double(statement, i));
+                    break;
+                default:
+                    result.value = QVariant(QString::fromUtf8(
+                        reinterpret_cast<const char *>(sqlite3_column_text(statement, i))));
+                    break;
+                }
+                break;
+            }
+            if (!result.value)
+                result.value = QVariant();
+        } else if (step != SQLITE_DONE) {
+            result.error = engineError(handle);
+        }
+        sqlite3_finalize(statement);
+        return result;
+    }
+
+    QSqlQuery query(database());
+    if (const auto error = runQuery(query, sql))
+        return {std::nullopt, error};
+    if (!query.next())
+        return {};
+    return {query.value(column), std::nullopt};
+}
+
+MyobSource::RowCount MyobSource::countRows(const QString &sql, int limit) const
+{
+    RowCount result;
+    if (sqlite3 *handle = m_companyFile ? m_companyFile->handle() : nullptr) {
+        sqlite3_stmt *statement = nullptr;
+        const QByteArray text = sql.toUtf8();
+        if (sqlite3_prepare_v2(handle, text.constData(), int(text.size()), &statement, nullptr) !=
+            SQLITE_OK) {
+            return {0, engineError(handle)};
+        }
+        int step = SQLITE_ROW;
+        while (result.rows <= limit && (step = sqlite3_step(statement)) == SQLITE_ROW)
+            ++result.rows;
+        if (step != SQLITE_ROW && step != SQLITE_DONE)
+            result.error = engineError(handle);
+        sqlite3_finalize(statement);
+        return result;
+    }
+
+    QSqlQuery query(database());
+    if (const auto error = runQuery(query, sql))
+        return {0, error};
+    while (result.rows <= limit && query.next())
+        ++result.rows;
+    return result;
+}
+
 double MyobSource::accountMovement(const QString &accountCode, const QDate &from, const QDate &to)
 {
-    const QSqlDatabase db = database();
-    QSqlQuery query(db);
     std::optional<DbError> error;
     double result = 0.0;
-    if (!db.isOpen()) {
-        error = DbError{DbError::RecordsetClosed,
-                        u"Operation is not allowed when the object is closed."_s};
-    } else if (!(error = runQuery(query, u"SELECT * FROM Accounts WHERE AccountNumber LIKE '"_s
-                                             + accountCode + u"'"_s))) {
-        if (query.next()) {
-            const qint32 accountId = query.value(u"AccountID"_s).toInt();
-            QSqlQuery total(db);
-            error = runQuery(total,
-                             u"SELECT SUM(TaxExclusiveAmount) As Total FROM JournalRecords WHERE "
-                             u"AccountID='"_s
-                                 + QString::number(accountId)
-                                 + u"' AND TransactionDate BETWEEN '"_s + sqlDate(from)
-                                 + u"' AND '"_s + sqlDate(to) + u"'"_s);
-            if (!error && total.next()) {
+    if (!database().isOpen()) {
+        error = closedConnection();
+    } else {
+        const FirstRow account =
+            firstRow(u"SELECT * FROM Accounts WHERE AccountNumber LIKE '"_s + accountCode + u"'"_s,
+                     u"AccountID"_s);
+        error = account.error;
+        if (account.value) {
+            const qint32 accountId = account.value->toInt();
+            const FirstRow total = firstRow(
+                u"SELECT SUM(TaxExclusiveAmount) As Total FROM JournalRecords WHERE AccountID='"_s +
+                    QString::number(accountId) + u"' AND TransactionDate BETWEEN '"_s +
+                    sqlDate(from) + u"' AND '"_s + sqlDate(to) + u"'"_s,
+                u"Total"_s);
+            error = total.error;
+            if (total.value) {
                 bool numeric = false;
-                const double sum = total.value(0).toDouble(&numeric);
+                const double sum = total.value->toDouble(&numeric);
                 result = numeric ? Rounding::halfAwayFromZero(sum, 2) : 0.0;
             }
         }
     }
     if (error) {
-        ErrorReporter(m_prompter).reportError(error->number, error->description,
-                                              u"GetMYOBValue for Account "_s + accountCode);
+        ErrorReporter(m_prompter)
+            .reportError(error->number, error->description,
+                         u"GetMYOBValue for Account "_s + accountCode);
         return 0.0;
     }
     return result;
@@ -147,27 +243,20 @@ double MyobSource::accountMovement(const QString &accountCode, const QDate &from
 
 qint16 MyobSource::jobsCount(const QDate &from, const QDate &to)
 {
-    const QSqlDatabase db = database();
-    QSqlQuery query(db);
-    std::optional<DbError> error;
-    int count = 0;
-    if (!db.isOpen()) {
-        error = DbError{DbError::RecordsetClosed,
-                        u"Operation is not allowed when the object is closed."_s};
-    } else if (!(error = runQuery(query, u"SELECT * FROM Sales WHERE Date BETWEEN '"_s
-                                             + sqlDate(from) + u"' AND '"_s + sqlDate(to)
-                                             + u"'"_s))) {
-        while (query.next()) {
-            if (++count > MaxJobs) {
-                error = DbError{6, u"Overflow: more than %1 sales in the range."_s.arg(MaxJobs)};
-                break;
-            }
-        }
+    RowCount count;
+    if (!database().isOpen()) {
+        count.error = closedConnection();
+    } else {
+        count = countRows(u"SELECT * FROM Sales WHERE Date BETWEEN '"_s + sqlDate(from) +
+                              u"' AND '"_s + sqlDate(to) + u"'"_s,
+                          MaxJobs);
+        if (!count.error && count.rows > MaxJobs)
+            count.error = DbError{6, u"Overflow: more than %1 sales in the range."_s.arg(MaxJobs)};
     }
-    if (error) {
-        ErrorReporter(m_prompter).reportError(error->number, error->description,
-                                              u"GetMYOBJobs"_s);
+    if (count.error) {
+        ErrorReporter(m_prompter)
+            .reportError(count.error->number, count.error->description, u"GetMYOBJobs"_s);
         return 0;
     }
-    return qint16(count);
+    return qint16(count.rows);
 }

@@ -32,8 +32,7 @@ public:
 
     // The tax-exclusive movement of the first account whose number is LIKE the code, to two
     // decimals; 0 for no account, no records or an error (reported once per code).
-    double accountMovement(const QString &accountCode, const QDate &from,
-                           const QDate &to) override;
+    double accountMovement(const QString &accountCode, const QDate &from, const QDate &to) override;
     // The number of sales dated in the range; more than 32767 is reported, not wrapped.
     qint16 jobsCount(const QDate &from, const QDate &to) override;
 
@@ -44,7 +43,22 @@ public:
     qint16 getMYOBJobs(const QDate &from, const QDate &to) { return jobsCount(from, to); }
 
 private:
+    // The first row's value of one column of a query, or nothing when there is no row.
+    struct FirstRow
+    {
+        std::optional<QVariant> value;
+        std::optional<DbError> error;
+    };
+    struct RowCount
+    {
+        int rows = 0;
+        std::optional<DbError> error;
+    };
+
     QSqlDatabase database() const;
+    FirstRow firstRow(const QString &sql, const QString &column) const;
+    // Stops counting past the limit.
+    RowCount countRows(const QString &sql, int limit) const;
 
     const Settings &m_settings;
     Prompter &m_prompter;

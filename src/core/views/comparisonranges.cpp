@@ -18,8 +18,8 @@ QList<PeriodDataSet::Range> earlierRanges(const PeriodDataSet::Range &produced, 
                                           int count)
 {
     QList<PeriodDataSet::Range> ranges;
-    const int months = (produced.end.year() - produced.start.year()) * 12
-                       + (produced.end.month() - produced.start.month()) + 1;
+    const int months = (produced.end.year() - produced.start.year()) * 12 +
+                       (produced.end.month() - produced.start.month()) + 1;
     PeriodDataSet::Range previous = produced;
     for (int i = 1; i <= std::min(count, PeriodDataSet::SlotCount - 1); ++i) {
         PeriodDataSet::Range range;
@@ -28,7 +28,8 @@ QList<PeriodDataSet::Range> earlierRanges(const PeriodDataSet::Range &produced, 
             // on 29 February 2008, not a day short of it.
             range = {previous.start.addYears(-1), endOfMonth(previous.end.addYears(-1))};
         } else {
-            range = {previous.start.addMonths(-months), endOfMonth(previous.end.addMonths(-months))};
+            range = {previous.start.addMonths(-months),
+                     endOfMonth(previous.end.addMonths(-months))};
         }
         ranges << range;
         previous = range;

@@ -17,7 +17,7 @@ enum OptimalType : quint8 { NoOptimal = 0, AtMost = 1, AtLeast = 2 };
 struct Result
 {
     double optimal = 0.0;
-    double variant = 0.0;   // 0 or more: the optimal is met; to one decimal
+    double variant = 0.0; // 0 or more: the optimal is met; to one decimal
     quint8 band = Red;
     quint8 optimalType = NoOptimal;
 };

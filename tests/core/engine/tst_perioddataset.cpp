@@ -21,6 +21,7 @@ private Q_SLOTS:
     void sumSkipsAbsentIds();
     void slotsAreSeparate();
     void findFieldPosComparesNumerically();
+    void lookupsFollowTheSlotAsItGrows();
     void formatFieldValue_data();
     void formatFieldValue();
     void textThatIsNotANumberReadsAsZero();
@@ -157,6 +158,33 @@ void TestPeriodDataSet::findFieldPosComparesNumerically()
     QCOMPARE(PeriodDataSet::findFieldPos(ids, 79), 2);
     QCOMPARE(PeriodDataSet::findFieldPos(ids, 12), 1);
     QCOMPARE(PeriodDataSet::findFieldPos(ids, 0), 0);
+}
+
+void TestPeriodDataSet::lookupsFollowTheSlotAsItGrows()
+{
+    PeriodDataSet data(m_numbers);
+    data.storeFieldValue(79, 10.0, 0);
+    QCOMPARE(data.getFieldValue(79), 10.0);
+    QCOMPARE(data.getFieldValue(80), 0.0);
+    data.storeFieldValue(80, 20.0, 0);
+    data.storeFieldValue(79, 30.0, 0);
+    QCOMPARE(data.getFieldValue(80), 20.0);
+    QCOMPARE(data.getFieldValue(79), 10.0);
+
+    // An entry written by hand in another form still counts, in its place.
+    data.current().fieldIds << u" 81.0"_s;
+    data.current().fieldValues << u"5"_s;
+    data.current().fieldAbs << u"5"_s;
+    data.current().fieldTypes << u"0"_s;
+    data.storeFieldValue(81, 99.0, 0);
+    QCOMPARE(data.getFieldValue(81), 5.0);
+    QCOMPARE(data.current().findFieldPos(81), 4);
+
+    // A slot replaced by a new one starts over.
+    data.clearCurrent();
+    QCOMPARE(data.getFieldValue(79), 0.0);
+    data.storeFieldValue(79, 7.0, 0);
+    QCOMPARE(data.getFieldValue(79), 7.0);
 }
 
 void TestPeriodDataSet::formatFieldValue_data()

@@ -50,7 +50,8 @@ void TestCompanyFile::collationOrder_data()
     QTest::addColumn<QByteArray>("left");
     QTest::addColumn<QByteArray>("right");
     QTest::addColumn<int>("order");
-    QTest::newRow("calendar, not text") << QByteArray("2 Jul 2006") << QByteArray("10 Jul 2006") << -1;
+    QTest::newRow("calendar, not text")
+        << QByteArray("2 Jul 2006") << QByteArray("10 Jul 2006") << -1;
     QTest::newRow("across forms") << QByteArray("2006-06-30") << QByteArray("1 Jul 2006") << -1;
     QTest::newRow("same day") << QByteArray("2006-07-01") << QByteArray("1 jul 2006") << 0;
     QTest::newRow("year decides") << QByteArray("1 Jan 2007") << QByteArray("2006-12-31") << 1;
@@ -96,8 +97,9 @@ void TestCompanyFile::rangeQueriesUseTheIndex()
     SqliteConnection connection;
     QCOMPARE(CompanyFile::open(connection, dir.filePath(u"shop.myo"_s)), std::nullopt);
     QSqlQuery query(connection.database());
-    const QString sql = u"SELECT SUM(TaxExclusiveAmount) As Total FROM JournalRecords WHERE "
-                        u"AccountID='1' AND TransactionDate BETWEEN '1 Jul 2006' AND '31 Jul 2006'"_s;
+    const QString sql =
+        u"SELECT SUM(TaxExclusiveAmount) As Total FROM JournalRecords WHERE "
+        u"AccountID='1' AND TransactionDate BETWEEN '1 Jul 2006' AND '31 Jul 2006'"_s;
     QVERIFY(query.exec(sql) && query.next());
     QCOMPARE(query.value(0).toDouble(), -3100.0);
     QVERIFY(query.exec(u"EXPLAIN QUERY PLAN "_s + sql));

@@ -53,11 +53,11 @@ void TestMyobSource::initTestCase()
     writer.addAccount(u"4-1500"_s, u"Sublet (no movements)"_s);
     const qint64 rounding = writer.addAccount(u"6-9000"_s, u"Sundry"_s);
 
-    writer.addJournalLine(panel, QDate(2006, 6, 30), -999.0);    // the day before
+    writer.addJournalLine(panel, QDate(2006, 6, 30), -999.0); // the day before
     writer.addJournalLine(panel, QDate(2006, 7, 1), -1000.0);
     writer.addJournalLine(panel, QDate(2006, 7, 15), -250.5);
     writer.addJournalLine(panel, QDate(2006, 7, 31), -49.5);
-    writer.addJournalLine(panel, QDate(2006, 8, 1), -777.0);     // the day after
+    writer.addJournalLine(panel, QDate(2006, 8, 1), -777.0); // the day after
     writer.addJournalLine(panelSub, QDate(2006, 7, 10), -5000.0);
     writer.addJournalLine(parts, QDate(2006, 7, 20), -300.0);
     writer.addJournalLine(parts, QDate(2006, 7, 20), 120.25);
@@ -116,8 +116,8 @@ void TestMyobSource::accountMovement_data()
     QTest::newRow("half a cent rounds away from zero") << u"6-9000"_s << july1 << july31 << 1234.57;
     QTest::newRow("account without movements") << u"4-1500"_s << july1 << july31 << 0.0;
     QTest::newRow("no such account") << u"9-9999"_s << july1 << july31 << 0.0;
-    QTest::newRow("range with nothing in it") << u"4-1100"_s << QDate(2007, 1, 1)
-                                              << QDate(2007, 12, 31) << 0.0;
+    QTest::newRow("range with nothing in it")
+        << u"4-1100"_s << QDate(2007, 1, 1) << QDate(2007, 12, 31) << 0.0;
 }
 
 void TestMyobSource::accountMovement()
@@ -145,8 +145,8 @@ void TestMyobSource::failingQueryIsReportedAndCountsAsZero()
     // The code goes into the SQL text as it is; a quote in it breaks the statement.
     QCOMPARE(source.getMYOBValue(u"4-11'00"_s, QDate(2006, 7, 1), QDate(2006, 7, 31)), 0.0);
     QCOMPARE(prompter.messages().size(), 1);
-    QVERIFY(prompter.messages().first().title.startsWith(
-        u"GetMYOBValue for Account 4-11'00 Error "_s));
+    QVERIFY(
+        prompter.messages().first().title.startsWith(u"GetMYOBValue for Account 4-11'00 Error "_s));
     // The next code is read as if nothing had happened.
     QCOMPARE(source.getMYOBValue(u"4-1100"_s, QDate(2006, 7, 1), QDate(2006, 7, 31)), -1300.0);
     QCOMPARE(prompter.messages().size(), 1);

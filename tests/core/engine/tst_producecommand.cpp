@@ -1,0 +1,159 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "testworkspace.h"
+
+#include "app/settingsloader.h"
+#include "database/mainconnector.h"
+#include "engine/producecommand.h"
+#include "sources/accountingsource.h"
+#include "sources/companyfilewriter.h"
+
+#include <QTest>
+
+using namespace Qt::StringLiterals;
+
+using Selection = ProduceCommand::Selection;
+using Outcome = ProduceCommand::Outcome;
+Q_DECLARE_METATYPE(Selection)
+
+class TestProduceCommand : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void init();
+    void cleanup();
+    void rangeEnds_data();
+    void rangeEnds();
+    void firstProduceOpensTheCompanyFile();
+    void invalidRangeIsRefused_data();
+    void invalidRangeIsRefused();
+    void noSourceAndNoFile();
+    void unreadableCompanyFileIsReported();
+
+private:
+    bool start()
+    {
+        return loadSettings(m_workspace->context()).isEmpty() &&
+               connectMainDatabase(m_workspace->context()).isEmpty();
+    }
+
+    std::unique_ptr<TestWorkspace> m_workspace;
+};
+
+void TestProduceCommand::init()
+{
+    m_workspace = std::make_unique<TestWorkspace>();
+    QVERIFY(m_workspace->configure(u"MYOB"_s));
+    const QString ledger = m_workspace->path(u"ledger.myo"_s);
+    CompanyFileWriter writer;
+    QCOMPARE(writer.create(ledger), std::nullopt);
+    const qint64 panel = writer.addAccount(u"4-1100"_s, u"Panel Labour"_s);
+    writer.addJournalLine(panel, QDate(2008, 2, 29), -2900.0);
+    writer.addJournalLine(panel, QDate(2008, 3, 1), -100.0);
+    writer.addSale(QDate(2008, 2, 29), u"INV1"_s);
+    QCOMPARE(writer.finish(), std::nullopt);
+    m_workspace->store().writeSetting(u"AccFilePath"_s, ledger);
+}
+
+void TestProduceCommand::cleanup()
+{
+    m_workspace.reset();
+}
+
+void TestProduceCommand::rangeEnds_data()
+{
+    QTest::addColumn<int>("month");
+    QTest::addColumn<int>("year");
+    QTest::addColumn<QDate>("end");
+    QTest::newRow("leap February") << 2 << 2008 << QDate(2008, 2, 29);
+    QTest::newRow("plain February") << 2 << 2007 << QDate(2007, 2, 28);
+    QTest::newRow("December") << 12 << 2006 << QDate(2006, 12, 31);
+}
+
+void TestProduceCommand::rangeEnds()
+{
+    QFETCH(int, month);
+    QFETCH(int, year);
+    QFETCH(QDate, end);
+    QCOMPARE(ProduceCommand::rangeEnd({1, 2000, month, year}), end);
+    QCOMPARE(ProduceCommand::rangeStart({month, year, 1, 2000}), QDate(year, month, 1));
+}
+
+void TestProduceCommand::firstProduceOpensTheCompanyFile()
+{
+    QVERIFY(start());
+    AppContext &context = m_workspace->context();
+    QVERIFY(!context.accountingSource());
+    QCOMPARE(ProduceCommand(context).produce({2, 2008, 2, 2008}), Outcome::Produced);
+    QVERIFY(context.accountingSource()->isReachable());
+    QCOMPARE(context.periodDataSet().getFieldValue(13), 2900.0);
+    QCOMPARE(context.periodDataSet().getFieldValue(97), 1.0);
+    QCOMPARE(context.periodDataSet().range(0).end, QDate(2008, 2, 29));
+
+    SettingsStore &store = m_workspace->store();
+    QCOMPARE(store.readSetting(u"M1"_s), u"1"_s);
+    QCOMPARE(store.readSetting(u"M2"_s), u"1"_s);
+    QCOMPARE(store.readSetting(u"Y1"_s), u"2008"_s);
+    QCOMPARE(store.readSetting(u"Y2"_s), u"2008"_s);
+    QVERIFY(!m_workspace->prompter().isBusy());
+}
+
+void TestProduceCommand::invalidRangeIsRefused_data()
+{
+    QTest::addColumn<Selection>("selection");
+    QTest::addColumn<bool>("valid");
+    QTest::newRow("March to February") << Selection{3, 2006, 2, 2006} << false;
+    QTest::newRow("a later year first") << Selection{1, 2007, 12, 2006} << false;
+    QTest::newRow("one month") << Selection{3, 2006, 3, 2006} << true;
+}
+
+void TestProduceCommand::invalidRangeIsRefused()
+{
+    QFETCH(Selection, selection);
+    QFETCH(bool, valid);
+    QVERIFY(start());
+    AppContext &context = m_workspace->context();
+    context.periodDataSet().storeFieldValue(79, 5.0, 0); // the previous produce
+    m_workspace->prompter().clearMessages();
+
+    QCOMPARE(ProduceCommand(context).produce(selection),
+             valid ? Outcome::Produced : Outcome::InvalidRange);
+    // The range is recorded even when it is refused.
+    QCOMPARE(context.periodDataSet().range(0).start, ProduceCommand::rangeStart(selection));
+    if (valid)
+        return;
+    QCOMPARE(m_workspace->prompter().messages().size(), 1);
+    const RecordingPrompter::Message &message = m_workspace->prompter().messages().first();
+    QCOMPARE(message.title, u"Invalid Date Range"_s);
+    QCOMPARE(message.text, u"The selected date range is invalid! Make sure the second date is "
+                           u"the same or later than the first."_s);
+    QCOMPARE(context.periodDataSet().getFieldValue(79), 5.0);
+    QCOMPARE(m_workspace->store().readSetting(u"M1"_s), QString());
+}
+
+void TestProduceCommand::noSourceAndNoFile()
+{
+    m_workspace->store().writeSetting(u"AccFilePath"_s, QString());
+    QVERIFY(start());
+    QCOMPARE(ProduceCommand(m_workspace->context()).produce({1, 2008, 1, 2008}), Outcome::NoSource);
+    const RecordingPrompter::Message &message = m_workspace->prompter().messages().last();
+    QCOMPARE(message.title, u"Cannot Produce KPI's"_s);
+    QCOMPARE(message.text,
+             u"There is no running instance of MYOB and your primary Account data file has not "
+             u"been specified!\r\n\r\nYou can specify your primary Accounting file in the "
+             u"System Configuration."_s);
+}
+
+void TestProduceCommand::unreadableCompanyFileIsReported()
+{
+    QFile::remove(m_workspace->path(u"ledger.myo"_s));
+    QVERIFY(start());
+    m_workspace->prompter().clearMessages();
+    QCOMPARE(ProduceCommand(m_workspace->context()).produce({1, 2008, 1, 2008}), Outcome::Failed);
+    QCOMPARE(m_workspace->prompter().messages().size(), 1);
+    QVERIFY(m_workspace->prompter().messages().first().title.startsWith(u"Produce Error "_s));
+    QVERIFY(!m_workspace->prompter().isBusy());
+}
+
+QTEST_GUILESS_MAIN(TestProduceCommand)
+#include "tst_producecommand.moc"

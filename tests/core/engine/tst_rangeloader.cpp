@@ -1,0 +1,377 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "testworkspace.h"
+
+#include "app/settingsloader.h"
+#include "database/mainconnector.h"
+#include "engine/formulatable.h"
+#include "engine/rangeloader.h"
+#include "sources/companyfilewriter.h"
+#include "sources/myobsource.h"
+
+#include <QSqlError>
+#include <QSqlQuery>
+#include <QTest>
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+// The hand-made ledger: every account-mapped Field reads its own account X<id>, moved once
+// in July 2025 by the amount below (credits negative), with 23 sales in the month.
+const QList<QPair<int, double>> Movements = {
+    {13, -12000.4}, {14, 5000.25},   {17, 812.6},   {21, -8000.8},   {22, 3500.35}, {25, 1210.45},
+    {26, 402.15},   {35, -15000.55}, {36, 11020.3}, {43, -3000.3},   {45, 1610.7},  {49, 455.45},
+    {72, -12000.4}, {73, -8000.8},   {74, -3000.3}, {75, -15000.55}, {76, -900.9},  {77, -400.4},
+    {78, -100.1},   {81, 5000.25},   {82, 3500.35}, {83, 812.6},     {84, 11020.3}, {85, 1610.7},
+    {86, 455.45},   {87, 700.7},     {88, 350.35},  {99, -120.5},    {101, 4200.2}, {102, 3900.25},
+    {117, 300.3},   {118, 250.25},   {119, 180.18}, {120, 300.3}};
+
+const QDate July1(2025, 7, 1);
+const QDate July31(2025, 7, 31);
+
+class PeriodLimitedSource : public AccountingSource
+{
+public:
+    explicit PeriodLimitedSource(QDate periodEnd)
+        : m_periodEnd(periodEnd)
+    {}
+    bool isReachable() override { return true; }
+    std::optional<DbError> openDataFile() override { return std::nullopt; }
+    void disconnect() override {}
+    double accountMovement(const QString &, const QDate &, const QDate &) override
+    {
+        ++queries;
+        return -10.0;
+    }
+    qint16 jobsCount(const QDate &, const QDate &) override { return 4; }
+    std::optional<QDate> currentPeriodEnd() override { return m_periodEnd; }
+    int queries = 0;
+
+private:
+    QDate m_periodEnd;
+};
+
+} // namespace
+
+class TestRangeLoader : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void init();
+    void cleanup();
+    void everyFormulaStep_data();
+    void everyFormulaStep();
+    void accountFiguresAreStoredUnrounded();
+    void nothingToDivideBy();
+    void hiddenFieldIsNotLoaded();
+    void codesAroundPlusAreTrimmedAndSummed();
+    void failingCodeIsReportedOncePerCodeAndTheLoadGoesOn();
+    void workingDays_data();
+    void workingDays();
+    void periodLimit_data();
+    void periodLimit();
+    void hourlyRates();
+    void everyStepParses();
+
+private:
+    AppContext &context() { return m_workspace->context(); }
+    void execute(const QString &sql)
+    {
+        QSqlQuery query(context().mainDatabase().database());
+        QVERIFY2(query.exec(sql), qPrintable(query.lastError().text()));
+    }
+    void load(const QDate &from, const QDate &to)
+    {
+        context().mainDatabase().requeryFields();
+        context().periodDataSet().setCurrentSlot(0);
+        RangeLoader(context()).loadDateRange(from, to);
+    }
+    QString storedValue(int id) const
+    {
+        const PeriodDataSet::Slot &slot = m_workspace->context().periodDataSet().current();
+        const int pos = PeriodDataSet::findFieldPos(slot.fieldIds, id);
+        return pos > 0 ? slot.fieldValues.at(pos - 1) : u"<absent>"_s;
+    }
+
+    std::unique_ptr<TestWorkspace> m_workspace;
+};
+
+void TestRangeLoader::init()
+{
+    m_workspace = std::make_unique<TestWorkspace>();
+    QVERIFY(m_workspace->configure(u"MYOB"_s));
+    const QString ledger = m_workspace->path(u"ledger.myo"_s);
+    CompanyFileWriter writer;
+    QCOMPARE(writer.create(ledger), std::nullopt);
+    for (const auto &[id, amount] : Movements) {
+        const qint64 account = writer.addAccount(u"X%1"_s.arg(id), u"Field %1"_s.arg(id));
+        writer.addJournalLine(account, July1.addDays(id % 28), amount);
+        writer.addJournalLine(account, July1.addDays(-1), 1000000.0); // outside the range
+    }
+    writer.addAccount(u"BAD"_s, u"Never moved"_s);
+    for (int i = 0; i < 23; ++i)
+        writer.addSale(July1.addDays(i), u"S%1"_s.arg(i));
+    writer.addSale(July31.addDays(1), u"AUGUST"_s);
+    QCOMPARE(writer.finish(), std::nullopt);
+    m_workspace->store().writeSetting(u"AccFilePath"_s, ledger);
+
+    QCOMPARE(loadSettings(context()), QString());
+    QCOMPARE(connectMainDatabase(context()), QString());
+    execute(u"UPDATE Fields SET Data = 'X' || ID WHERE Type = 2"_s);
+    execute(u"UPDATE Hours SET Value = 98 WHERE ID = 1"_s);
+    execute(u"UPDATE Hours SET Value = 104 WHERE ID = 2"_s);
+    context().mainDatabase().hoursRecordset().requery();
+    context().setAccountingSource(
+        std::make_unique<MyobSource>(context().settings(), m_workspace->prompter()));
+    QCOMPARE(context().accountingSource()->openDataFile(), std::nullopt);
+    m_workspace->prompter().clearMessages();
+}
+
+void TestRangeLoader::cleanup()
+{
+    m_workspace.reset();
+}
+
+void TestRangeLoader::everyFormulaStep_data()
+{
+    QTest::addColumn<int>("field");
+    QTest::addColumn<double>("expected");
+    // Worked out independently of this program from the ledger above: D = 30, W = 23,
+    // J = 23, panel rate 98, paint rate 104.
+    QTest::newRow("79") << 79 << 39153.2;
+    QTest::newRow("104") << 104 << 12.8;
+    QTest::newRow("105") << 105 << 8.9;
+    QTest::newRow("89") << 89 << -23810.68;
+    QTest::newRow("90") << 90 << 15342.52;
+    QTest::newRow("92") << 92 << 39.2;
+    QTest::newRow("106") << 106 << 60.8;
+    QTest::newRow("107") << 107 << 10.7;
+    QTest::newRow("108") << 108 << 10.0;
+    QTest::newRow("103") << 103 << -8100.45;
+    QTest::newRow("109") << 109 << 20.7;
+    QTest::newRow("110") << 110 << 7242.07;
+    QTest::newRow("111") << 111 << 18.5;
+    QTest::newRow("112") << 112 << 314.87;
+    QTest::newRow("15") << 15 << 7000.15;
+    QTest::newRow("16") << 16 << 58.3;
+    QTest::newRow("18") << 18 << 6187.55;
+    QTest::newRow("19") << 19 << 51.6;
+    QTest::newRow("23") << 23 << 4500.45;
+    QTest::newRow("24") << 24 << 56.3;
+    QTest::newRow("27") << 27 << 2887.85;
+    QTest::newRow("28") << 28 << 36.1;
+    QTest::newRow("30") << 30 << 20001.2;
+    QTest::newRow("31") << 31 << 11500.6;
+    QTest::newRow("32") << 32 << 57.3;
+    QTest::newRow("33") << 33 << 9075.4;
+    QTest::newRow("34") << 34 << 43.9;
+    QTest::newRow("37") << 37 << 3980.25;
+    QTest::newRow("38") << 38 << 26.5;
+    QTest::newRow("39") << 39 << 652.2;
+    QTest::newRow("40") << 40 << -479.14;
+    QTest::newRow("41") << 41 << 39.5;
+    QTest::newRow("42") << 42 << 38.3;
+    QTest::newRow("93") << 93 << 173.05;
+    QTest::newRow("46") << 46 << 53.7;
+    QTest::newRow("47") << 47 << 4.1;
+    QTest::newRow("50") << 50 << 15.2;
+    QTest::newRow("51") << 51 << 1.2;
+    QTest::newRow("53") << 53 << -2066.15;
+    QTest::newRow("54") << 54 << 68.9;
+    QTest::newRow("55") << 55 << 5.3;
+    QTest::newRow("115") << 115 << 10.0;
+    QTest::newRow("116") << 116 << 0.8;
+    QTest::newRow("96") << 96 << 23.0;
+    QTest::newRow("97") << 97 << 23.0;
+    QTest::newRow("94") << 94 << 1.0;
+    QTest::newRow("124") << 124 << 1702.31;
+    QTest::newRow("56") << 56 << 5.0;
+    QTest::newRow("57") << 57 << 869.62;
+    QTest::newRow("58") << 58 << -369.59;
+    QTest::newRow("59") << 59 << 500.03;
+    QTest::newRow("60") << 60 << 57.5;
+    QTest::newRow("125") << 125 << -352.19;
+    QTest::newRow("126") << 126 << 314.87;
+    QTest::newRow("62") << 62 << 122.5;
+    QTest::newRow("63") << 63 << 76.9;
+    QTest::newRow("64") << 64 << 199.4;
+    QTest::newRow("65") << 65 << 5.3;
+    QTest::newRow("66") << 66 << 3.3;
+    QTest::newRow("67") << 67 << 8.7;
+    QTest::newRow("127") << 127 << 42.63;
+    QTest::newRow("68") << 68 << -15.74;
+    QTest::newRow("69") << 69 << -5.23;
+    QTest::newRow("98") << 98 << -20.97;
+    QTest::newRow("70") << 70 << -6.63;
+    QTest::newRow("113") << 113 << -3.91;
+    QTest::newRow("1") << 1 << 58.3;
+    QTest::newRow("2") << 2 << 56.3;
+    QTest::newRow("3") << 3 << 51.6;
+    QTest::newRow("4") << 4 << 36.1;
+    QTest::newRow("5") << 5 << 26.5;
+    QTest::newRow("6") << 6 << 39.5;
+    QTest::newRow("7") << 7 << 23.0;
+    QTest::newRow("8") << 8 << 1702.31;
+    QTest::newRow("11") << 11 << 39.2;
+}
+
+void TestRangeLoader::everyFormulaStep()
+{
+    QFETCH(int, field);
+    QFETCH(double, expected);
+    load(July1, July31);
+    QCOMPARE(storedValue(field).toDouble(), expected);
+    QCOMPARE(context().periodDataSet().getFieldValue(field), expected);
+    QVERIFY(m_workspace->prompter().messages().isEmpty());
+    QVERIFY(!m_workspace->prompter().isBusy());
+}
+
+void TestRangeLoader::accountFiguresAreStoredUnrounded()
+{
+    load(July1, July31);
+    const PeriodDataSet &data = context().periodDataSet();
+    QCOMPARE(storedValue(13), u"-12000.4"_s);
+    QCOMPARE(data.getFieldValue(13), 12000.4);
+    QCOMPARE(data.getFieldAbs(13), 12000.4);
+    QCOMPARE(storedValue(119), u"180.18"_s);
+    QCOMPARE(data.getFieldValue(119), -180.18);
+    // Account figures come first, in Field order, and keep their Type as the code.
+    const PeriodDataSet::Slot &slot = data.current();
+    const int firstDerived = PeriodDataSet::findFieldPos(slot.fieldIds, 79);
+    for (int i = 0; i < firstDerived - 1; ++i)
+        QCOMPARE(slot.fieldTypes.at(i), u"2"_s);
+    QCOMPARE(firstDerived, Movements.size() + 1);
+}
+
+void TestRangeLoader::nothingToDivideBy()
+{
+    // No movements and no sales: J = 0 and total sales 0.
+    load(QDate(2030, 7, 1), QDate(2030, 7, 31));
+    const QList<int> absent = {8,   16,  19,  24,  28,  38,  39,  40,  41,  42,  46,
+                               47,  50,  51,  54,  55,  57,  58,  60,  65,  66,  67,
+                               68,  69,  70,  92,  93,  98,  104, 105, 106, 107, 108,
+                               109, 111, 113, 115, 116, 124, 125, 126, 127};
+    for (const FormulaTable::Step &step : FormulaTable::steps()) {
+        const QString stored = storedValue(step.field);
+        if (absent.contains(step.field))
+            QVERIFY2(stored == u"<absent>"_s, qPrintable(u"Field %1"_s.arg(step.field)));
+        else if (step.field == 96)
+            QCOMPARE(stored, u"23"_s); // working days of July 2030
+        else
+            QVERIFY2(stored.isEmpty(), qPrintable(u"Field %1: %2"_s.arg(step.field).arg(stored)));
+    }
+    // Account figures of 0 are written as 0.
+    QCOMPARE(storedValue(13), u"0"_s);
+    QCOMPARE(context().periodDataSet().current().fieldAbs.first(), u"0"_s);
+}
+
+void TestRangeLoader::hiddenFieldIsNotLoaded()
+{
+    execute(u"UPDATE Fields SET Hide = 1 WHERE ID = 13"_s);
+    load(July1, July31);
+    QCOMPARE(storedValue(13), u"<absent>"_s);
+    // Every formula that reads it reads 0: 15 = V[13] + V[14].
+    QCOMPARE(storedValue(15), u"-5000.25"_s);
+    QCOMPARE(storedValue(16), u"<absent>"_s);
+}
+
+void TestRangeLoader::codesAroundPlusAreTrimmedAndSummed()
+{
+    execute(u"UPDATE Fields SET Data = ' X13 +  X72+X999 ' WHERE ID = 13"_s);
+    load(July1, July31);
+    QCOMPARE(storedValue(13), u"-24000.8"_s);
+    QVERIFY(m_workspace->prompter().messages().isEmpty());
+}
+
+void TestRangeLoader::failingCodeIsReportedOncePerCodeAndTheLoadGoesOn()
+{
+    execute(u"UPDATE Fields SET Data = 'X14+B''AD' WHERE ID = 14"_s);
+    execute(u"UPDATE Fields SET Data = 'B''AD' WHERE ID = 17"_s);
+    load(July1, July31);
+    const QList<RecordingPrompter::Message> &messages = m_workspace->prompter().messages();
+    QCOMPARE(messages.size(), 2);
+    for (const RecordingPrompter::Message &message : messages)
+        QVERIFY(message.title.startsWith(u"GetMYOBValue for Account B'AD Error "_s));
+    QCOMPARE(storedValue(14), u"5000.25"_s);
+    QCOMPARE(storedValue(17), u"0"_s);
+    QCOMPARE(storedValue(79), u"39153.2"_s);
+    QCOMPARE(storedValue(11), u"39.2"_s);
+}
+
+void TestRangeLoader::workingDays_data()
+{
+    QTest::addColumn<QDate>("from");
+    QTest::addColumn<QDate>("to");
+    QTest::addColumn<int>("working");
+    QTest::newRow("July 2025") << July1 << July31 << 23;
+    QTest::newRow("one Saturday") << QDate(2025, 7, 5) << QDate(2025, 7, 5) << 0;
+    QTest::newRow("one Monday") << QDate(2025, 7, 7) << QDate(2025, 7, 7) << 1;
+    QTest::newRow("a full week") << QDate(2025, 7, 7) << QDate(2025, 7, 13) << 5;
+    QTest::newRow("leap February") << QDate(2008, 2, 1) << QDate(2008, 2, 29) << 21;
+    QTest::newRow("end before start") << July31 << July1 << 0;
+}
+
+void TestRangeLoader::workingDays()
+{
+    QFETCH(QDate, from);
+    QFETCH(QDate, to);
+    QFETCH(int, working);
+    QCOMPARE(RangeLoader::workingDays(from, to), working);
+}
+
+void TestRangeLoader::periodLimit_data()
+{
+    QTest::addColumn<QDate>("periodEnd");
+    QTest::addColumn<bool>("beyond");
+    QTest::newRow("ends with the period") << July31 << false;
+    QTest::newRow("period ends later") << QDate(2026, 6, 30) << false;
+    QTest::newRow("period ended before") << QDate(2025, 6, 30) << true;
+    QTest::newRow("period end unreadable") << QDate() << true;
+}
+
+void TestRangeLoader::periodLimit()
+{
+    QFETCH(QDate, periodEnd);
+    QFETCH(bool, beyond);
+    auto source = std::make_unique<PeriodLimitedSource>(periodEnd);
+    PeriodLimitedSource *fake = source.get();
+    context().setAccountingSource(std::move(source));
+    context().setNumberFormat(NumberFormat(QLocale(QLocale::English, QLocale::Australia)));
+    load(July1, July31);
+
+    const QList<RecordingPrompter::Message> &messages = m_workspace->prompter().messages();
+    QCOMPARE(messages.size(), beyond ? 1 : 0);
+    QCOMPARE(fake->queries > 0, !beyond);
+    // The jobs count is read either way.
+    QCOMPARE(storedValue(97), u"4"_s);
+    if (beyond) {
+        QCOMPARE(messages.first().title, u"Data Out Of Range"_s);
+        QCOMPARE(messages.first().icon, Prompter::Icon::Exclamation);
+        QVERIFY(messages.first().text.startsWith(
+            u"The selected date range 1/7/25 to 31/7/25 exceeds the\r\naccounting period of "
+            u"your MoneyWorks file which ends "_s));
+        QCOMPARE(storedValue(13), u"<absent>"_s);
+    }
+}
+
+void TestRangeLoader::hourlyRates()
+{
+    RangeLoader loader(context());
+    QCOMPARE(loader.hourlyRate(1), 98.0);
+    QCOMPARE(loader.hourlyRate(2), 104.0);
+    QCOMPARE(loader.hourlyRate(3), 0.0);
+    execute(u"UPDATE Hours SET Value = NULL WHERE ID = 2"_s);
+    context().mainDatabase().hoursRecordset().requery();
+    QCOMPARE(loader.hourlyRate(2), 0.0);
+}
+
+void TestRangeLoader::everyStepParses()
+{
+    QCOMPARE(FormulaTable::steps().size(), 75);
+    for (int i = 0; i < FormulaTable::steps().size(); ++i)
+        QCOMPARE(FormulaTable::steps().at(i).number, i + 1);
+}
+
+QTEST_GUILESS_MAIN(TestRangeLoader)
+#include "tst_rangeloader.moc"

@@ -1,0 +1,168 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "app/numberformat.h"
+#include "engine/perioddataset.h"
+#include "views/comparisonranges.h"
+#include "views/kpievaluation.h"
+
+#include <QTest>
+
+using namespace Qt::StringLiterals;
+using namespace KpiEvaluation;
+
+class TestKpiEvaluation : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void evaluateBenchmark_data();
+    void evaluateBenchmark();
+    void nothingToEvaluateKeepsTheCallersValues();
+    void valueCellText_data();
+    void valueCellText();
+    void benchmarkCell();
+    void comparisonRanges_data();
+    void comparisonRanges();
+
+private:
+    NumberFormat m_numbers{QLocale(QLocale::English, QLocale::Australia)};
+};
+
+void TestKpiEvaluation::evaluateBenchmark_data()
+{
+    QTest::addColumn<QString>("benchmark");
+    QTest::addColumn<double>("actual");
+    QTest::addColumn<double>("optimal");
+    QTest::addColumn<double>("variant");
+    QTest::addColumn<int>("band");
+    QTest::addColumn<int>("type");
+
+    QTest::newRow("margin met") << u">45,<35"_s << 52.3 << 45.0 << 7.3 << 2 << 2;
+    QTest::newRow("margin exactly met") << u">45,<35"_s << 45.0 << 45.0 << 0.0 << 2 << 2;
+    QTest::newRow("margin short, above the red line")
+        << u">45,<35"_s << 40.0 << 45.0 << -5.0 << 1 << 2;
+    QTest::newRow("margin on the red line") << u">45,<35"_s << 35.0 << 45.0 << -10.0 << 1 << 2;
+    QTest::newRow("margin below the red line") << u">45,<35"_s << 30.04 << 45.0 << -15.0 << 0 << 2;
+    QTest::newRow("cost met") << u"<30,>40"_s << 28.0 << 30.0 << 2.0 << 2 << 1;
+    QTest::newRow("cost over, under the red line")
+        << u"<30,>40"_s << 33.0 << 30.0 << -3.0 << 1 << 1;
+    QTest::newRow("cost over the red line") << u"<30,>40"_s << 45.5 << 30.0 << -15.5 << 0 << 1;
+    QTest::newRow("no second element: red") << u">45"_s << 44.9 << 45.0 << -0.1 << 0 << 2;
+    QTest::newRow("negative actual") << u">10,<5"_s << -3.2 << 10.0 << -13.2 << 0 << 2;
+    QTest::newRow("bare number") << u"30"_s << 12.0 << 0.0 << 0.0 << 2 << 0;
+    QTest::newRow("not a number counts as 0") << u"<abc"_s << 5.0 << 0.0 << -5.0 << 0 << 1;
+    QTest::newRow("both characters: a < element") << u"<>20"_s << 10.0 << 0.0 << -10.0 << 0 << 1;
+    QTest::newRow("variant to one decimal") << u">45"_s << 45.04 << 45.0 << 0.0 << 2 << 2;
+    QTest::newRow("decimal benchmark") << u"<1.5,>2.5"_s << 2.0 << 1.5 << -0.5 << 1 << 1;
+}
+
+void TestKpiEvaluation::evaluateBenchmark()
+{
+    QFETCH(QString, benchmark);
+    QFETCH(double, actual);
+    QFETCH(double, optimal);
+    QFETCH(double, variant);
+    QFETCH(int, band);
+    QFETCH(int, type);
+    const Result result = KpiEvaluation::evaluateBenchmark(benchmark, actual, m_numbers);
+    QCOMPARE(result.optimal, optimal);
+    QCOMPARE(result.variant, variant);
+    QCOMPARE(int(result.band), band);
+    QCOMPARE(int(result.optimalType), type);
+}
+
+void TestKpiEvaluation::nothingToEvaluateKeepsTheCallersValues()
+{
+    const Result start{1.0, 2.0, Yellow, AtLeast};
+    for (const auto &[benchmark, actual] : {std::pair{u">45"_s, 0.0}, std::pair{QString(), 12.0}}) {
+        const Result result = KpiEvaluation::evaluateBenchmark(benchmark, actual, m_numbers, start);
+        QCOMPARE(result.optimal, 1.0);
+        QCOMPARE(result.variant, 2.0);
+        QCOMPARE(int(result.band), int(Yellow));
+    }
+}
+
+void TestKpiEvaluation::valueCellText_data()
+{
+    QTest::addColumn<int>("type");
+    QTest::addColumn<qint64>("id");
+    QTest::addColumn<QString>("text");
+    QTest::newRow("heading") << 1 << qint64(72) << QString();
+    QTest::newRow("income account") << 2 << qint64(72) << u"$ 1,200.00"_s;
+    QTest::newRow("expense account shows its size") << 2 << qint64(81) << u"$ 450.50"_s;
+    QTest::newRow("account of zero") << 2 << qint64(83) << u"$ -"_s;
+    QTest::newRow("percentage") << 3 << qint64(16) << u"-12.3%"_s;
+    QTest::newRow("percentage of zero") << 3 << qint64(92) << QString();
+    QTest::newRow("count") << 4 << qint64(97) << u"1,234"_s;
+    QTest::newRow("hours") << 4 << qint64(62) << u"12.5"_s;
+    QTest::newRow("computed money, negative") << 5 << qint64(110) << u"$ 2,500.75"_s;
+    QTest::newRow("absent Field") << 5 << qint64(999) << QString();
+}
+
+void TestKpiEvaluation::valueCellText()
+{
+    QFETCH(int, type);
+    QFETCH(qint64, id);
+    QFETCH(QString, text);
+    PeriodDataSet data(m_numbers);
+    data.storeAccountFigure(72, -1200.0, 2);
+    data.storeAccountFigure(81, 450.5, 2);
+    data.storeAccountFigure(83, 0.0, 2);
+    data.storeFieldValue(16, -0.123, 1);
+    data.storeFieldValue(92, 0.0, 1);
+    data.storeFieldValue(97, 1234, 3);
+    data.storeFieldValue(62, 12.5, 4);
+    data.storeFieldValue(110, -2500.75, 0);
+    QCOMPARE(KpiEvaluation::valueCellText(type, id, data, m_numbers), text);
+}
+
+void TestKpiEvaluation::benchmarkCell()
+{
+    QCOMPARE(benchmarkCellText(u">45,<35"_s), u">45%"_s);
+    QCOMPARE(benchmarkCellText(u"<30"_s), u"<30%"_s);
+    QCOMPARE(benchmarkCellText(QString()), QString());
+}
+
+void TestKpiEvaluation::comparisonRanges_data()
+{
+    QTest::addColumn<QDate>("start");
+    QTest::addColumn<QDate>("end");
+    QTest::addColumn<QString>("kind");
+    QTest::addColumn<int>("count");
+    QTest::addColumn<QList<QDate>>("expected"); // start, end of each earlier range
+
+    QTest::newRow("financial years") << QDate(2003, 7, 1) << QDate(2004, 6, 30) << u"Years"_s << 2
+                                     << QList<QDate>{QDate(2002, 7, 1), QDate(2003, 6, 30),
+                                                     QDate(2001, 7, 1), QDate(2002, 6, 30)};
+    QTest::newRow("quarters") << QDate(2007, 1, 1) << QDate(2007, 3, 31) << u"Periods"_s << 1
+                              << QList<QDate>{QDate(2006, 10, 1), QDate(2006, 12, 31)};
+    QTest::newRow("two months end on the month's last day")
+        << QDate(2008, 3, 1) << QDate(2008, 4, 30) << u"Periods"_s << 2
+        << QList<QDate>{QDate(2008, 1, 1), QDate(2008, 2, 29), QDate(2007, 11, 1),
+                        QDate(2007, 12, 31)};
+    QTest::newRow("a year back keeps the whole of February")
+        << QDate(2008, 3, 1) << QDate(2009, 2, 28) << u"years"_s << 1
+        << QList<QDate>{QDate(2007, 3, 1), QDate(2008, 2, 29)};
+    QTest::newRow("at most four") << QDate(2020, 1, 1) << QDate(2020, 1, 31) << u"Periods"_s << 9
+                                  << QList<QDate>{QDate(2019, 12, 1), QDate(2019, 12, 31),
+                                                  QDate(2019, 11, 1), QDate(2019, 11, 30),
+                                                  QDate(2019, 10, 1), QDate(2019, 10, 31),
+                                                  QDate(2019, 9, 1),  QDate(2019, 9, 30)};
+}
+
+void TestKpiEvaluation::comparisonRanges()
+{
+    QFETCH(QDate, start);
+    QFETCH(QDate, end);
+    QFETCH(QString, kind);
+    QFETCH(int, count);
+    QFETCH(QList<QDate>, expected);
+    const auto ranges =
+        ComparisonRanges::earlierRanges({start, end}, *ComparisonRanges::kindFromText(kind), count);
+    QList<QDate> dates;
+    for (const PeriodDataSet::Range &range : ranges)
+        dates << range.start << range.end;
+    QCOMPARE(dates, expected);
+}
+
+QTEST_GUILESS_MAIN(TestKpiEvaluation)
+#include "tst_kpievaluation.moc"
