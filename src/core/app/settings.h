@@ -25,6 +25,9 @@ struct Settings
     QString accFileUser;
     QString accFilePass; // deciphered
 
+    // How long a MoneyWorks server may take to answer one request.
+    int moneyWorksTimeoutSeconds = 15;
+
     qint16 scrollBarHeight = 16;
     qint32 currentYear = 0;
 };

@@ -53,6 +53,8 @@ QString loadSettings(AppContext &context)
     settings.accFilePath = store.readSetting(u"AccFilePath"_s);
     settings.accFileDriver = store.readSetting(u"AccFileDriver"_s);
     settings.accFileUser = store.readSetting(u"AccFileUser"_s);
+    const int timeout = store.readSetting(u"MWTimeout"_s).toInt();
+    settings.moneyWorksTimeoutSeconds = timeout > 0 ? timeout : 15;
     const QString storedPassword = store.readSetting(u"AccFilePass"_s);
     settings.accFilePass =
         storedPassword.isEmpty()

@@ -34,6 +34,8 @@ public:
 
     // The drivers offered; "SQLite" is the built-in company-file engine.
     static QStringList driverNames();
+    // A MoneyWorks document on a server (http:// or https://), which is not a file to check.
+    static bool isServerAddress(const QString &path);
     // The file chooser's filter for the package's data files.
     static QString fileFilter(const QString &package);
 

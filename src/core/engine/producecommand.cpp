@@ -30,7 +30,8 @@ ProduceCommand::Outcome ProduceCommand::produce(const Selection &selection)
 {
     const Settings &settings = m_context.settings();
     if (!m_context.accountingSource())
-        m_context.setAccountingSource(createAccountingSource(settings, m_context.prompter()));
+        m_context.setAccountingSource(
+            createAccountingSource(settings, m_context.prompter(), m_context.numberFormat()));
     AccountingSource *source = m_context.accountingSource();
     if (!source) {
         ErrorReporter(m_context.prompter())

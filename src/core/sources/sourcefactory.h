@@ -5,10 +5,12 @@
 
 #include <memory>
 
+class NumberFormat;
 class Prompter;
 struct Settings;
 
 // The source for the configured accounting package, or nothing for a package this build
 // cannot read.
 std::unique_ptr<AccountingSource> createAccountingSource(const Settings &settings,
-                                                         Prompter &prompter);
+                                                         Prompter &prompter,
+                                                         const NumberFormat &numbers);

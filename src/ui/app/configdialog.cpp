@@ -92,23 +92,28 @@ void ConfigDialog::buildLayout()
     fileRow->addWidget(m_txtAccFilePath);
     fileRow->addWidget(m_butBrowseFile);
 
-    m_picLogin = new QGroupBox(u"MYOB"_s, this);
+    m_picLogin = new QGroupBox(u"Login"_s, this);
     m_picLogin->setObjectName(u"picLogin"_s);
-    m_lstDriver = new QComboBox(m_picLogin);
+    m_driverRow = new QWidget(m_picLogin);
+    m_lstDriver = new QComboBox(m_driverRow);
     m_lstDriver->setObjectName(u"lstDriver"_s);
     m_lstDriver->setEditable(true);
     m_lstDriver->addItems(SystemConfiguration::driverNames());
+    auto *driverHint = new QLabel(u"(this driver must exist in the ODBC drivers list)"_s,
+                                  m_driverRow);
+    driverHint->setEnabled(false);
+    auto *driverForm = new QFormLayout(m_driverRow);
+    driverForm->setContentsMargins(0, 0, 0, 0);
+    driverForm->addRow(u"Driver"_s, m_lstDriver);
+    driverForm->addRow(QString(), driverHint);
+
     m_txtAccUsername = new QLineEdit(m_picLogin);
     m_txtAccUsername->setObjectName(u"txtAccUsername"_s);
     m_txtAccPassword = new QLineEdit(m_picLogin);
     m_txtAccPassword->setObjectName(u"txtAccPassword"_s);
     m_txtAccPassword->setEchoMode(QLineEdit::Password);
-    auto *driverHint =
-        new QLabel(u"(this driver must exist in the ODBC drivers list)"_s, m_picLogin);
-    driverHint->setEnabled(false);
     auto *loginForm = new QFormLayout(m_picLogin);
-    loginForm->addRow(u"Driver"_s, m_lstDriver);
-    loginForm->addRow(QString(), driverHint);
+    loginForm->addRow(m_driverRow);
     loginForm->addRow(u"Username"_s, m_txtAccUsername);
     loginForm->addRow(u"Password"_s, m_txtAccPassword);
     m_picLogin->setVisible(false);
@@ -157,7 +162,9 @@ void ConfigDialog::loadValues()
 void ConfigDialog::selectPackage(int index)
 {
     m_packageName = PackageCaptions[index];
-    m_picLogin->setVisible(m_packageName == u"MYOB"_s);
+    // A MoneyWorks server asks for a login too; only MYOB needs a driver.
+    m_picLogin->setVisible(true);
+    m_driverRow->setVisible(m_packageName == u"MYOB"_s);
     m_fileFilter = SystemConfiguration::fileFilter(m_packageName);
 }
 

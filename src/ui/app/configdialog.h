@@ -35,6 +35,7 @@ public:
     QLineEdit *txtAccFilePath() const { return m_txtAccFilePath; }
     QWidget *picLogin() const { return m_picLogin; }
     QComboBox *lstDriver() const { return m_lstDriver; }
+    QWidget *driverRow() const { return m_driverRow; }
     QLineEdit *txtAccUsername() const { return m_txtAccUsername; }
     QLineEdit *txtAccPassword() const { return m_txtAccPassword; }
     QPushButton *butOK() const { return m_butOK; }
@@ -61,6 +62,7 @@ private:
     QLineEdit *m_txtAccFilePath = nullptr;
     QToolButton *m_butBrowseFile = nullptr;
     QWidget *m_picLogin = nullptr;
+    QWidget *m_driverRow = nullptr;
     QComboBox *m_lstDriver = nullptr;
     QLineEdit *m_txtAccUsername = nullptr;
     QLineEdit *m_txtAccPassword = nullptr;

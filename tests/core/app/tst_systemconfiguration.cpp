@@ -52,6 +52,9 @@ void TestSystemConfiguration::checksInOrder_data()
     QTest::newRow("MoneyWorks, missing file")
         << u"<shared>"_s << u"MoneyWorks"_s << u"/no/Acme.mwd5"_s << QString() << FileMissing
         << u"Invalid File Path"_s;
+    QTest::newRow("MoneyWorks server address, not a file")
+        << u"<shared>"_s << u"MoneyWorks"_s << u"http://127.0.0.1:6710/Acme.moneyworks"_s
+        << QString() << QString() << QString();
     QTest::newRow("MoneyWorks with nothing else")
         << u"<shared>"_s << u"MoneyWorks"_s << QString() << QString() << QString() << QString();
     QTest::newRow("MYOB complete")

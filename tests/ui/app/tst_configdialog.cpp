@@ -69,10 +69,15 @@ void TestConfigDialog::switchingPackageHidesButKeepsTheLogin()
     dialog.optAccPackage(1)->click();
     QCOMPARE(dialog.packageName(), u"MYOB"_s);
     QVERIFY(!dialog.picLogin()->isHidden());
+    QVERIFY(!dialog.driverRow()->isHidden());
     dialog.txtAccUsername()->setText(u"Admin"_s);
+    dialog.lstDriver()->setEditText(u"MYOAU0901"_s);
     dialog.optAccPackage(0)->click();
     QCOMPARE(dialog.packageName(), u"MoneyWorks"_s);
-    QVERIFY(dialog.picLogin()->isHidden());
+    // A MoneyWorks server takes a login as well; the driver is MYOB's alone.
+    QVERIFY(!dialog.picLogin()->isHidden());
+    QVERIFY(dialog.driverRow()->isHidden());
+    QCOMPARE(dialog.lstDriver()->currentText(), u"MYOAU0901"_s);
 
     dialog.txtDBPath()->setText(workspace.sharedFolder());
     dialog.butOK()->click();

@@ -1,0 +1,122 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "restmoneyworkslink.h"
+
+#include <QEventLoop>
+#include <QNetworkAccessManager>
+#include <QNetworkReply>
+#include <QSaveFile>
+#include <QTimer>
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+QString encoded(const QString &value)
+{
+    return QString::fromLatin1(QUrl::toPercentEncoding(value));
+}
+
+} // namespace
+
+RestMoneyWorksLink::RestMoneyWorksLink(QString user, QString password, int timeoutSeconds)
+    : m_user(std::move(user))
+    , m_password(std::move(password))
+    , m_timeoutSeconds(timeoutSeconds > 0 ? timeoutSeconds : 15)
+{}
+
+RestMoneyWorksLink::~RestMoneyWorksLink() = default;
+
+MoneyWorksLink::Answer RestMoneyWorksLink::evaluate(const QString &expression)
+{
+    // Without an open document nothing is open: that is the answer, not an error.
+    if (m_document.isEmpty() && expression == u"DocumentPath"_s)
+        return {};
+    return get(u"evaluate"_s, u"expr="_s + encoded(expression));
+}
+
+std::optional<DbError> RestMoneyWorksLink::openDocument(const QString &document)
+{
+    const QUrl address(document, QUrl::TolerantMode);
+    const QString scheme = address.scheme().toLower();
+    const QString name = address.path().mid(1);
+    if ((scheme != u"http"_s && scheme != u"https"_s) || address.host().isEmpty()
+        || name.isEmpty()) {
+        return DbError{NotADocumentError,
+                       u"'%1' is not the address of a MoneyWorks document, such as "
+                       u"http://server:6710/Acme.moneyworks."_s.arg(document)};
+    }
+    m_server = address.adjusted(QUrl::RemovePath | QUrl::RemoveQuery | QUrl::RemoveFragment
+                                | QUrl::RemoveUserInfo);
+    m_document = name;
+    // The REST interface keeps no state: what "open" can do is make sure the document answers.
+    const Answer answer = get(u"evaluate"_s, u"expr="_s + encoded(u"DocumentPath"_s));
+    if (answer.error) {
+        m_document.clear();
+        return answer.error;
+    }
+    return std::nullopt;
+}
+
+std::optional<DbError> RestMoneyWorksLink::exportRecords(const QString &sortField,
+                                                         const QString &search,
+                                                         const QString &outputFile)
+{
+    const Answer answer =
+        get(u"export"_s, u"table=transaction&search="_s + encoded(search) + u"&sort="_s
+                             + encoded(sortField) + u"&format="_s
+                             + encoded(u"[TheirRef]\t[Detail.Account]\n"_s));
+    if (answer.error)
+        return answer.error;
+    QSaveFile file(outputFile);
+    const QByteArray bytes = answer.text.toUtf8();
+    if (!file.open(QIODevice::WriteOnly) || file.write(bytes) != bytes.size() || !file.commit())
+        return DbError{75, u"Cannot write %1: %2"_s.arg(outputFile, file.errorString())};
+    return std::nullopt;
+}
+
+MoneyWorksLink::Answer RestMoneyWorksLink::get(const QString &command, const QString &parameters)
+{
+    if (m_document.isEmpty())
+        return {{}, DbError{NotADocumentError, u"No MoneyWorks document is open."_s}};
+    if (!m_network)
+        m_network = std::make_unique<QNetworkAccessManager>();
+
+    QUrl url = m_server;
+    url.setPath(u"/REST/"_s + encoded(m_document) + u'/' + command + u'/' + parameters,
+                QUrl::TolerantMode);
+    QNetworkRequest request(url);
+    request.setRawHeader("Authorization",
+                         "Basic " + (m_user + u':' + m_password).toUtf8().toBase64());
+    request.setAttribute(QNetworkRequest::RedirectPolicyAttribute,
+                         QNetworkRequest::NoLessSafeRedirectPolicy);
+
+    std::unique_ptr<QNetworkReply> reply(m_network->get(request));
+    QEventLoop loop;
+    QTimer timer;
+    timer.setSingleShot(true);
+    bool timedOut = false;
+    QObject::connect(reply.get(), &QNetworkReply::finished, &loop, &QEventLoop::quit);
+    QObject::connect(&timer, &QTimer::timeout, &loop, [&] {
+        timedOut = true;
+        loop.quit();
+    });
+    timer.start(m_timeoutSeconds * 1000);
+    if (!reply->isFinished())
+        loop.exec(QEventLoop::ExcludeUserInputEvents);
+
+    if (timedOut) {
+        reply->abort();
+        return {{}, DbError{TimeoutError, u"The MoneyWorks server at %1 did not answer within %2 "
+                                          u"seconds."_s.arg(m_server.toDisplayString())
+                                              .arg(m_timeoutSeconds)}};
+    }
+    const int status = reply->attribute(QNetworkRequest::HttpStatusCodeAttribute).toInt();
+    const QString body = QString::fromUtf8(reply->readAll());
+    if (status == 401)
+        return {{}, DbError{401, u"The MoneyWorks server refused the user name or password."_s}};
+    if (reply->error() != QNetworkReply::NoError || status >= 400) {
+        const QString reason = body.trimmed().isEmpty() ? reply->errorString() : body.trimmed();
+        return {{}, DbError{status ? status : int(reply->error()), reason}};
+    }
+    return {body, std::nullopt};
+}
