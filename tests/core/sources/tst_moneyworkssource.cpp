@@ -1,0 +1,316 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "simulatorprocess.h"
+#include "testworkspace.h"
+
+#include "app/settingsloader.h"
+#include "database/mainconnector.h"
+#include "engine/rangeloader.h"
+#include "sources/companyfilewriter.h"
+#include "sources/moneyworkssource.h"
+#include "sources/restmoneyworkslink.h"
+
+#include <QSqlQuery>
+#include <QTcpServer>
+#include <QTest>
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+const QString Document = u"Harbour Panel & Paint.moneyworks"_s;
+
+// Answers from a script, and remembers what it was asked.
+class ScriptedLink : public MoneyWorksLink
+{
+public:
+    QHash<QString, Answer> answers;
+    QStringList asked;
+
+    Answer evaluate(const QString &expression) override
+    {
+        asked << expression;
+        return answers.value(expression, Answer{u"[ERROR] Unknown"_s, std::nullopt});
+    }
+    std::optional<DbError> openDocument(const QString &) override { return std::nullopt; }
+    std::optional<DbError> exportRecords(const QString &, const QString &search,
+                                         const QString &) override
+    {
+        asked << search;
+        return std::nullopt;
+    }
+};
+
+} // namespace
+
+class TestMoneyWorksSource : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void initTestCase();
+    void textsSentToMoneyWorks();
+    void countJobReferences_data();
+    void countJobReferences();
+    void answersThatAreNotNumbers_data();
+    void answersThatAreNotNumbers();
+    void movementsThroughTheServer();
+    void jobsThroughTheServer();
+    void periodEnd_data();
+    void periodEnd();
+    void wrongCredentials();
+    void serverThatDoesNotAnswer();
+    void addressThatIsNoDocument();
+
+private:
+    std::unique_ptr<MoneyWorksSource> sourceFor(ScriptedLink *&link);
+    std::unique_ptr<MoneyWorksSource> serverSource(const QString &user, const QString &password,
+                                                   int port, int timeoutSeconds = 15);
+
+    QTemporaryDir m_dir;
+    QString m_ledger;
+    RecordingPrompter m_prompter;
+    Settings m_settings;
+    NumberFormat m_numbers{QLocale(QLocale::English, QLocale::Australia)};
+    SimulatorProcess m_simulator;
+};
+
+void TestMoneyWorksSource::initTestCase()
+{
+    m_ledger = m_dir.filePath(u"ledger.myo"_s);
+    CompanyFileWriter writer;
+    QCOMPARE(writer.create(m_ledger), std::nullopt);
+    const qint64 panel = writer.addAccount(u"4-1100"_s, u"Panel Labour"_s);
+    const qint64 wages = writer.addAccount(u"5-1100"_s, u"Panel Wages"_s);
+    writer.addJournalLine(panel, QDate(2025, 7, 1), -1000.0);
+    writer.addJournalLine(panel, QDate(2025, 7, 31), -234.56);
+    writer.addJournalLine(panel, QDate(2025, 8, 1), -99.0);
+    writer.addJournalLine(wages, QDate(2025, 7, 4), 400.25);
+    for (int day = 1; day <= 5; ++day)
+        writer.addSale(QDate(2025, 7, day), u"RO%1"_s.arg(day));
+    QCOMPARE(writer.finish(), std::nullopt);
+
+    m_settings.appFolder = m_dir.path() + u'/';
+    QVERIFY2(m_simulator.start({u"--ledger"_s, m_ledger, u"--document"_s, Document, u"--user"_s,
+                                u"Admin"_s, u"--password"_s, u"s3cret"_s, u"--period-end"_s,
+                                u"2025-07-31"_s}),
+             qPrintable(m_simulator.problem()));
+}
+
+std::unique_ptr<MoneyWorksSource> TestMoneyWorksSource::sourceFor(ScriptedLink *&link)
+{
+    auto scripted = std::make_unique<ScriptedLink>();
+    link = scripted.get();
+    auto holder = std::make_shared<std::unique_ptr<ScriptedLink>>(std::move(scripted));
+    return std::make_unique<MoneyWorksSource>(m_settings, m_prompter, m_numbers, [holder] {
+        return std::unique_ptr<MoneyWorksLink>(holder->release());
+    });
+}
+
+std::unique_ptr<MoneyWorksSource> TestMoneyWorksSource::serverSource(const QString &user,
+                                                                     const QString &password,
+                                                                     int port, int timeoutSeconds)
+{
+    m_settings.accFilePath = u"http://127.0.0.1:%1/"_s.arg(port)
+                             + QString::fromLatin1(QUrl::toPercentEncoding(Document));
+    return std::make_unique<MoneyWorksSource>(m_settings, m_prompter, m_numbers,
+                                              [user, password, timeoutSeconds] {
+                                                  return std::make_unique<RestMoneyWorksLink>(
+                                                      user, password, timeoutSeconds);
+                                              });
+}
+
+void TestMoneyWorksSource::textsSentToMoneyWorks()
+{
+    ScriptedLink *link = nullptr;
+    auto source = sourceFor(link);
+    QCOMPARE(source->movementExpression(u"4-1100"_s, QDate(2025, 7, 1), QDate(2025, 7, 31)),
+             u"GetMovement(`accountcode = \\\"4-1100\\\"`, '1/7/25 ', '31/7/25')"_s);
+    // Codes go in unescaped: a quote in one changes the expression.
+    QCOMPARE(source->movementExpression(u"4\"11"_s, QDate(2025, 7, 1), QDate(2025, 7, 1)),
+             u"GetMovement(`accountcode = \\\"4\"11\\\"`, '1/7/25 ', '1/7/25')"_s);
+    QCOMPARE(source->jobsSearch(QDate(2025, 7, 1), QDate(2025, 7, 31)),
+             u"type = `DI@` and transdate >= '1/7/25' and transdate <= '31/7/25'"_s);
+    QCOMPARE(source->jobsFile(), m_settings.appFolder + u"jobs.inf"_s);
+}
+
+void TestMoneyWorksSource::countJobReferences_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<int>("jobs");
+    const QString header = u"TransDate\tTheirRef\tU.Detail.Account\r\n"_s;
+    QTest::newRow("only the header") << header << 0;
+    QTest::newRow("nothing at all") << QString() << 0;
+    QTest::newRow("empty line after the last break")
+        << header + u"1/7/25\tRO1\t4-1100\r\n1/7/25\tRO2\t4-1100\r\n"_s << 2;
+    QTest::newRow("one invoice, two lines") << header + u"x\tRO1\t4-1100\r\nx\tRO1\t4-1400"_s << 1;
+    QTest::newRow("references differing in case")
+        << header + u"x\tro1\t4-1100\r\nx\tRO1\t4-1100"_s << 2;
+    QTest::newRow("12 and 123") << header + u"x\t12\t4-1100\r\nx\t123\t4-1100"_s << 2;
+    QTest::newRow("EI in either case")
+        << header + u"x\tRO1\tEI\r\nx\tRO2\tei\r\nx\tRO3\t4-1100"_s << 1;
+    QTest::newRow("blank reference") << header + u"x\t  \t4-1100\r\nx\tRO3\t4-1100"_s << 1;
+    QTest::newRow("line too short") << header + u"x\r\nx\tRO3"_s << 1;
+    QTest::newRow("names missing: first column")
+        << u"a\tb\r\nRO1\tx\r\nRO2\tx"_s << 2;
+    QTest::newRow("a name twice: the later column")
+        << u"theirref\ttheirref\r\nA\tB\r\nA\tC"_s << 2;
+}
+
+void TestMoneyWorksSource::countJobReferences()
+{
+    QFETCH(QString, text);
+    QFETCH(int, jobs);
+    QCOMPARE(MoneyWorksSource::countJobReferences(text), jobs);
+}
+
+void TestMoneyWorksSource::answersThatAreNotNumbers_data()
+{
+    QTest::addColumn<QString>("answer");
+    QTest::addColumn<double>("value");
+    QTest::newRow("number") << u"-1234.56"_s << -1234.56;
+    QTest::newRow("no movement") << u"0"_s << 0.0;
+    QTest::newRow("grouped") << u"1,234.50"_s << 1234.5;
+    QTest::newRow("error text") << u"[ERROR] Unknown identifier"_s << 0.0;
+    QTest::newRow("empty") << QString() << 0.0;
+}
+
+void TestMoneyWorksSource::answersThatAreNotNumbers()
+{
+    QFETCH(QString, answer);
+    QFETCH(double, value);
+    ScriptedLink *link = nullptr;
+    auto source = sourceFor(link);
+    const QDate day(2025, 7, 1);
+    m_prompter.clearMessages();
+    source->isReachable(); // makes the link
+    link->answers.insert(source->movementExpression(u"4-1100"_s, day, day), {answer, std::nullopt});
+    QCOMPARE(source->accountMovement(u"4-1100"_s, day, day), value);
+    QVERIFY(m_prompter.messages().isEmpty());
+}
+
+void TestMoneyWorksSource::movementsThroughTheServer()
+{
+    auto source = serverSource(u"Admin"_s, u"s3cret"_s, m_simulator.port());
+    m_prompter.clearMessages();
+    QVERIFY(!source->isReachable());
+    QCOMPARE(source->openDataFile(), std::nullopt);
+    QVERIFY(source->isReachable());
+    const QDate first(2025, 7, 1);
+    const QDate last(2025, 7, 31);
+    QCOMPARE(source->accountMovement(u"4-1100"_s, first, last), -1234.56);
+    QCOMPARE(source->accountMovement(u"4-1100"_s, last, last), -234.56);
+    QCOMPARE(source->accountMovement(u"5-1100"_s, first, last), 400.25);
+    QCOMPARE(source->accountMovement(u"9-9999"_s, first, last), 0.0);
+    QCOMPARE(source->accountMovement(u"4\"1100"_s, first, last), 0.0);
+    QVERIFY(m_prompter.messages().isEmpty());
+}
+
+void TestMoneyWorksSource::jobsThroughTheServer()
+{
+    auto source = serverSource(u"Admin"_s, u"s3cret"_s, m_simulator.port());
+    QCOMPARE(source->openDataFile(), std::nullopt);
+    m_prompter.clearMessages();
+    QCOMPARE(source->jobsCount(QDate(2025, 7, 1), QDate(2025, 7, 31)), qint16(5));
+    QCOMPARE(source->jobsCount(QDate(2025, 7, 2), QDate(2025, 7, 3)), qint16(2));
+    QCOMPARE(source->jobsCount(QDate(2024, 1, 1), QDate(2024, 1, 31)), qint16(0));
+    QVERIFY(QFileInfo::exists(source->jobsFile()));
+    QVERIFY(m_prompter.messages().isEmpty());
+}
+
+void TestMoneyWorksSource::periodEnd_data()
+{
+    QTest::addColumn<QDate>("end");
+    QTest::addColumn<bool>("refused");
+    QTest::newRow("ends with the period") << QDate(2025, 7, 31) << false;
+    QTest::newRow("one day later") << QDate(2025, 8, 1) << true;
+}
+
+void TestMoneyWorksSource::periodEnd()
+{
+    QFETCH(QDate, end);
+    QFETCH(bool, refused);
+    TestWorkspace workspace;
+    QVERIFY(workspace.configure(u"MoneyWorks"_s));
+    QCOMPARE(loadSettings(workspace.context()), QString());
+    QCOMPARE(connectMainDatabase(workspace.context()), QString());
+    workspace.context().setNumberFormat(m_numbers);
+    workspace.context().settings().accFilePath = u"http://127.0.0.1:%1/"_s.arg(m_simulator.port())
+                                                 + QString::fromLatin1(
+                                                     QUrl::toPercentEncoding(Document));
+    workspace.context().settings().accFileUser = u"Admin"_s;
+    workspace.context().settings().accFilePass = u"s3cret"_s;
+    QSqlQuery(workspace.context().mainDatabase().database())
+        .exec(u"UPDATE Fields SET Data = '4-1100' WHERE ID = 13"_s);
+    workspace.context().mainDatabase().requeryFields();
+
+    const Settings &settings = workspace.context().settings();
+    auto source = std::make_unique<MoneyWorksSource>(
+        settings, workspace.prompter(), workspace.context().numberFormat(),
+        [&settings] { return std::make_unique<RestMoneyWorksLink>(u"Admin"_s, u"s3cret"_s, 15); });
+    QCOMPARE(source->openDataFile(), std::nullopt);
+    workspace.context().setAccountingSource(std::move(source));
+    workspace.prompter().clearMessages();
+
+    RangeLoader(workspace.context()).loadDateRange(QDate(2025, 7, 1), end);
+    const QList<RecordingPrompter::Message> &messages = workspace.prompter().messages();
+    QCOMPARE(messages.size(), refused ? 1 : 0);
+    const PeriodDataSet &data = workspace.context().periodDataSet();
+    if (refused) {
+        QCOMPARE(messages.first().title, u"Data Out Of Range"_s);
+        QVERIFY(messages.first().text.endsWith(u"which ends 31/7/25!"_s));
+        QCOMPARE(PeriodDataSet::findFieldPos(data.current().fieldIds, 13), 0);
+    } else {
+        QCOMPARE(data.getFieldValue(13), 1234.56);
+    }
+    // Jobs are counted either way.
+    QVERIFY(data.getFieldValue(97) >= 5.0);
+}
+
+void TestMoneyWorksSource::wrongCredentials()
+{
+    auto source = serverSource(u"Admin"_s, u"wrong"_s, m_simulator.port());
+    const std::optional<DbError> error = source->openDataFile();
+    QVERIFY(error);
+    QCOMPARE(error->number, 401);
+    QVERIFY(!source->isReachable());
+}
+
+void TestMoneyWorksSource::serverThatDoesNotAnswer()
+{
+    // A server that takes connections and says nothing.
+    QTcpServer silent;
+    QVERIFY(silent.listen(QHostAddress::LocalHost));
+    auto source = serverSource(u"Admin"_s, u"s3cret"_s, silent.serverPort(), 1);
+    m_prompter.clearMessages();
+    const std::optional<DbError> error = source->openDataFile();
+    QVERIFY(error);
+    QCOMPARE(error->number, RestMoneyWorksLink::TimeoutError);
+
+    // Once open (the answers arrive late, not never), every code reports its own timeout.
+    SimulatorProcess slow;
+    QVERIFY2(slow.start({u"--ledger"_s, m_ledger, u"--document"_s, Document, u"--delay-ms"_s,
+                         u"1500"_s, u"--delay-after"_s, u"1"_s}),
+             qPrintable(slow.problem()));
+    auto late = serverSource(QString(), QString(), slow.port(), 1);
+    QCOMPARE(late->openDataFile(), std::nullopt);
+    m_prompter.clearMessages();
+    for (const QString &code : {u"4-1100"_s, u"5-1100"_s})
+        QCOMPARE(late->accountMovement(code, QDate(2025, 7, 1), QDate(2025, 7, 31)), 0.0);
+    QCOMPARE(m_prompter.messages().size(), 2);
+    for (const RecordingPrompter::Message &message : m_prompter.messages())
+        QCOMPARE(message.title, u"GetMWValue Error -2147023436"_s);
+}
+
+void TestMoneyWorksSource::addressThatIsNoDocument()
+{
+    m_settings.accFilePath = u"/books/Acme.moneyworks"_s;
+    MoneyWorksSource source(m_settings, m_prompter, m_numbers, [] {
+        return std::make_unique<RestMoneyWorksLink>(QString(), QString(), 15);
+    });
+    const std::optional<DbError> error = source.openDataFile();
+    QVERIFY(error);
+    QCOMPARE(error->number, RestMoneyWorksLink::NotADocumentError);
+}
+
+QTEST_GUILESS_MAIN(TestMoneyWorksSource)
+#include "tst_moneyworkssource.moc"
