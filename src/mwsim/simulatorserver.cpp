@@ -21,10 +21,10 @@ const auto InvalidExpression = u"[ERROR] Invalid expression"_s;
 
 QByteArray httpResponse(int status, const QByteArray &reason, const QByteArray &body)
 {
-    return "HTTP/1.1 " + QByteArray::number(status) + ' ' + reason
-           + "\r\nServer: MoneyWorks_Datacentre/9.2 REST/9.2\r\nContent-Type: text/plain; "
-             "charset=utf-8\r\nContent-Length: "
-           + QByteArray::number(body.size()) + "\r\nConnection: close\r\n\r\n" + body;
+    return "HTTP/1.1 " + QByteArray::number(status) + ' ' + reason +
+           "\r\nServer: MoneyWorks_Datacentre/9.2 REST/9.2\r\nContent-Type: text/plain; "
+           "charset=utf-8\r\nContent-Length: " +
+           QByteArray::number(body.size()) + "\r\nConnection: close\r\n\r\n" + body;
 }
 
 } // namespace

@@ -18,13 +18,13 @@ class SimulatorServer : public QObject
 public:
     struct Options
     {
-        QString ledger;          // a company file
-        QString document;        // the name clients ask for
-        QString user;            // empty: no login needed
+        QString ledger;   // a company file
+        QString document; // the name clients ask for
+        QString user;     // empty: no login needed
         QString password;
-        QDate periodEnd;         // the end of the current period
-        int delayMs = 0;         // wait this long before every answer
-        int delayAfter = 0;      // ... but answer this many requests at once first
+        QDate periodEnd;    // the end of the current period
+        int delayMs = 0;    // wait this long before every answer
+        int delayAfter = 0; // ... but answer this many requests at once first
     };
 
     explicit SimulatorServer(Options options, QObject *parent = nullptr);

@@ -20,7 +20,8 @@ public:
     // did not come up, with the reason in problem().
     bool start(const QStringList &options)
     {
-        m_process.start(QStringLiteral(VELTRIX_MW_SIM), options + QStringList{QStringLiteral("--port"), QStringLiteral("0")});
+        m_process.start(QStringLiteral(VELTRIX_MW_SIM),
+                        options + QStringList{QStringLiteral("--port"), QStringLiteral("0")});
         if (!m_process.waitForReadyRead(20000)) {
             m_problem = QString::fromUtf8(m_process.readAllStandardError());
             return false;
@@ -38,8 +39,8 @@ public:
     QString problem() const { return m_problem; }
     QString address(const QString &document) const
     {
-        return QStringLiteral("http://127.0.0.1:%1/").arg(m_port)
-               + QString::fromLatin1(QUrl::toPercentEncoding(document));
+        return QStringLiteral("http://127.0.0.1:%1/").arg(m_port) +
+               QString::fromLatin1(QUrl::toPercentEncoding(document));
     }
 
 private:

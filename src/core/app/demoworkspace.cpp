@@ -4,6 +4,9 @@
 #include "fileoperations.h"
 #include "settingsstore.h"
 
+#include "settings.h"
+
+#include "cipher/passwordcipher.h"
 #include "database/sqliteconnection.h"
 #include "sources/democompany.h"
 
@@ -12,6 +15,7 @@
 #include <QFile>
 #include <QSqlError>
 #include <QSqlQuery>
+#include <QUrl>
 
 using namespace Qt::StringLiterals;
 
@@ -95,9 +99,14 @@ std::optional<QString> create(const QString &folder, const QString &templateFile
         return problem;
     if (auto problem = DemoCompany::write(dir.filePath(CompanyFileName)))
         return problem;
+    QFile::remove(dir.filePath(LedgerFileName));
+    if (!QFile::copy(dir.filePath(CompanyFileName), dir.filePath(LedgerFileName)))
+        return u"Cannot write %1"_s.arg(dir.filePath(LedgerFileName));
 
     SettingsStore settings(dir.filePath(SettingsFileName));
     configure(settings, folder);
+    SettingsStore moneyWorks(dir.filePath(MoneyWorksSettingsFileName));
+    configureMoneyWorks(moneyWorks, folder);
     return std::nullopt;
 }
 
@@ -116,6 +125,19 @@ void configure(SettingsStore &store, const QString &folder)
     store.writeSetting(u"Y1"_s, u"2025"_s);
     store.writeSetting(u"M2"_s, u"5"_s);
     store.writeSetting(u"Y2"_s, u"2026"_s);
+}
+
+void configureMoneyWorks(SettingsStore &store, const QString &folder)
+{
+    configure(store, folder);
+    store.writeSetting(u"AccPackage"_s, u"MoneyWorks"_s);
+    store.writeSetting(u"AccFilePath"_s,
+                       u"http://127.0.0.1:%1/"_s.arg(MoneyWorksPort) +
+                           QString::fromLatin1(QUrl::toPercentEncoding(LedgerFileName)));
+    store.writeSetting(u"AccFileDriver"_s, QString());
+    store.writeSetting(u"AccFileUser"_s, MoneyWorksUser);
+    store.writeSetting(u"AccFilePass"_s,
+                       PasswordCipher().encryptText(MoneyWorksPassword, Settings::PasswordKey));
 }
 
 } // namespace DemoWorkspace

@@ -12,8 +12,8 @@ using namespace Qt::StringLiterals;
 
 bool SystemConfiguration::isServerAddress(const QString &path)
 {
-    return path.startsWith(u"http://"_s, Qt::CaseInsensitive)
-           || path.startsWith(u"https://"_s, Qt::CaseInsensitive);
+    return path.startsWith(u"http://"_s, Qt::CaseInsensitive) ||
+           path.startsWith(u"https://"_s, Qt::CaseInsensitive);
 }
 
 SystemConfiguration::SystemConfiguration(SettingsStore &store, Prompter &prompter)
@@ -55,8 +55,8 @@ bool SystemConfiguration::save(Values &values) const
          u"MYOB Data File Path Not Specified"_s},
         {myob && values.driver.isEmpty(), u"You must specify the MYOB database driver!"_s,
          u"MYOB ODBC Driver Not Specified"_s},
-        {!values.accFilePath.isEmpty() && !isServerAddress(values.accFilePath)
-             && !FileOperations::fileExists(values.accFilePath),
+        {!values.accFilePath.isEmpty() && !isServerAddress(values.accFilePath) &&
+             !FileOperations::fileExists(values.accFilePath),
          u"The account data file path you specified does not exist or is inacessible!"_s,
          u"Invalid File Path"_s},
     };

@@ -51,25 +51,25 @@ QString MoneyWorksSource::movementExpression(const QString &accountCode, const Q
                                              const QDate &to) const
 {
     const QLocale &locale = m_numbers.locale();
-    return u"GetMovement(`accountcode = \\\""_s + accountCode + u"\\\"`, '"_s
-           + ShortDate::format(from, locale) + u" ', '"_s + ShortDate::format(to, locale)
-           + u"')"_s;
+    return u"GetMovement(`accountcode = \\\""_s + accountCode + u"\\\"`, '"_s +
+           ShortDate::format(from, locale) + u" ', '"_s + ShortDate::format(to, locale) + u"')"_s;
 }
 
 QString MoneyWorksSource::jobsSearch(const QDate &from, const QDate &to) const
 {
     const QLocale &locale = m_numbers.locale();
-    return u"type = `DI@` and transdate >= '"_s + ShortDate::format(from, locale)
-           + u"' and transdate <= '"_s + ShortDate::format(to, locale) + u"'"_s;
+    return u"type = `DI@` and transdate >= '"_s + ShortDate::format(from, locale) +
+           u"' and transdate <= '"_s + ShortDate::format(to, locale) + u"'"_s;
 }
 
 double MoneyWorksSource::accountMovement(const QString &accountCode, const QDate &from,
                                          const QDate &to)
 {
-    const MoneyWorksLink::Answer answer = link().evaluate(movementExpression(accountCode, from, to));
+    const MoneyWorksLink::Answer answer =
+        link().evaluate(movementExpression(accountCode, from, to));
     if (answer.error) {
-        ErrorReporter(m_prompter).reportError(answer.error->number, answer.error->description,
-                                              u"GetMWValue"_s);
+        ErrorReporter(m_prompter)
+            .reportError(answer.error->number, answer.error->description, u"GetMWValue"_s);
         return 0.0;
     }
     // MoneyWorks answers a bad expression with an error text: that is a 0, not a failure.

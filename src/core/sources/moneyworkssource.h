@@ -28,8 +28,7 @@ public:
     std::optional<DbError> openDataFile() override;
     void disconnect() override;
 
-    double accountMovement(const QString &accountCode, const QDate &from,
-                           const QDate &to) override;
+    double accountMovement(const QString &accountCode, const QDate &from, const QDate &to) override;
     qint16 jobsCount(const QDate &from, const QDate &to) override;
     std::optional<QDate> currentPeriodEnd() override;
 

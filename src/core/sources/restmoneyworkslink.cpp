@@ -39,14 +39,14 @@ std::optional<DbError> RestMoneyWorksLink::openDocument(const QString &document)
     const QUrl address(document, QUrl::TolerantMode);
     const QString scheme = address.scheme().toLower();
     const QString name = address.path().mid(1);
-    if ((scheme != u"http"_s && scheme != u"https"_s) || address.host().isEmpty()
-        || name.isEmpty()) {
+    if ((scheme != u"http"_s && scheme != u"https"_s) || address.host().isEmpty() ||
+        name.isEmpty()) {
         return DbError{NotADocumentError,
                        u"'%1' is not the address of a MoneyWorks document, such as "
                        u"http://server:6710/Acme.moneyworks."_s.arg(document)};
     }
-    m_server = address.adjusted(QUrl::RemovePath | QUrl::RemoveQuery | QUrl::RemoveFragment
-                                | QUrl::RemoveUserInfo);
+    m_server = address.adjusted(QUrl::RemovePath | QUrl::RemoveQuery | QUrl::RemoveFragment |
+                                QUrl::RemoveUserInfo);
     m_document = name;
     // The REST interface keeps no state: what "open" can do is make sure the document answers.
     const Answer answer = get(u"evaluate"_s, u"expr="_s + encoded(u"DocumentPath"_s));
@@ -61,10 +61,9 @@ std::optional<DbError> RestMoneyWorksLink::exportRecords(const QString &sortFiel
                                                          const QString &search,
                                                          const QString &outputFile)
 {
-    const Answer answer =
-        get(u"export"_s, u"table=transaction&search="_s + encoded(search) + u"&sort="_s
-                             + encoded(sortField) + u"&format="_s
-                             + encoded(u"[TheirRef]\t[Detail.Account]\n"_s));
+    const Answer answer = get(u"export"_s, u"table=transaction&search="_s + encoded(search) +
+                                               u"&sort="_s + encoded(sortField) + u"&format="_s +
+                                               encoded(u"[TheirRef]\t[Detail.Account]\n"_s));
     if (answer.error)
         return answer.error;
     QSaveFile file(outputFile);
@@ -106,9 +105,10 @@ MoneyWorksLink::Answer RestMoneyWorksLink::get(const QString &command, const QSt
 
     if (timedOut) {
         reply->abort();
-        return {{}, DbError{TimeoutError, u"The MoneyWorks server at %1 did not answer within %2 "
-                                          u"seconds."_s.arg(m_server.toDisplayString())
-                                              .arg(m_timeoutSeconds)}};
+        return {{},
+                DbError{TimeoutError, u"The MoneyWorks server at %1 did not answer within %2 "
+                                      u"seconds."_s.arg(m_server.toDisplayString())
+                                          .arg(m_timeoutSeconds)}};
     }
     const int status = reply->attribute(QNetworkRequest::HttpStatusCodeAttribute).toInt();
     const QString body = QString::fromUtf8(reply->readAll());

@@ -9,9 +9,8 @@
 
 using namespace Qt::StringLiterals;
 
-std::unique_ptr<AccountingSource> createAccountingSource(const Settings &settings,
-                                                         Prompter &prompter,
-                                                         const NumberFormat &numbers)
+std::unique_ptr<AccountingSource>
+createAccountingSource(const Settings &settings, Prompter &prompter, const NumberFormat &numbers)
 {
     if (settings.accPackage == u"MYOB"_s)
         return std::make_unique<MyobSource>(settings, prompter);

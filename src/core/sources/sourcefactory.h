@@ -11,6 +11,5 @@ struct Settings;
 
 // The source for the configured accounting package, or nothing for a package this build
 // cannot read.
-std::unique_ptr<AccountingSource> createAccountingSource(const Settings &settings,
-                                                         Prompter &prompter,
-                                                         const NumberFormat &numbers);
+std::unique_ptr<AccountingSource>
+createAccountingSource(const Settings &settings, Prompter &prompter, const NumberFormat &numbers);

@@ -99,8 +99,8 @@ void ConfigDialog::buildLayout()
     m_lstDriver->setObjectName(u"lstDriver"_s);
     m_lstDriver->setEditable(true);
     m_lstDriver->addItems(SystemConfiguration::driverNames());
-    auto *driverHint = new QLabel(u"(this driver must exist in the ODBC drivers list)"_s,
-                                  m_driverRow);
+    auto *driverHint =
+        new QLabel(u"(this driver must exist in the ODBC drivers list)"_s, m_driverRow);
     driverHint->setEnabled(false);
     auto *driverForm = new QFormLayout(m_driverRow);
     driverForm->setContentsMargins(0, 0, 0, 0);

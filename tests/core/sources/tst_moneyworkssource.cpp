@@ -110,13 +110,12 @@ std::unique_ptr<MoneyWorksSource> TestMoneyWorksSource::serverSource(const QStri
                                                                      const QString &password,
                                                                      int port, int timeoutSeconds)
 {
-    m_settings.accFilePath = u"http://127.0.0.1:%1/"_s.arg(port)
-                             + QString::fromLatin1(QUrl::toPercentEncoding(Document));
-    return std::make_unique<MoneyWorksSource>(m_settings, m_prompter, m_numbers,
-                                              [user, password, timeoutSeconds] {
-                                                  return std::make_unique<RestMoneyWorksLink>(
-                                                      user, password, timeoutSeconds);
-                                              });
+    m_settings.accFilePath = u"http://127.0.0.1:%1/"_s.arg(port) +
+                             QString::fromLatin1(QUrl::toPercentEncoding(Document));
+    return std::make_unique<MoneyWorksSource>(
+        m_settings, m_prompter, m_numbers, [user, password, timeoutSeconds] {
+            return std::make_unique<RestMoneyWorksLink>(user, password, timeoutSeconds);
+        });
 }
 
 void TestMoneyWorksSource::textsSentToMoneyWorks()
@@ -150,10 +149,8 @@ void TestMoneyWorksSource::countJobReferences_data()
         << header + u"x\tRO1\tEI\r\nx\tRO2\tei\r\nx\tRO3\t4-1100"_s << 1;
     QTest::newRow("blank reference") << header + u"x\t  \t4-1100\r\nx\tRO3\t4-1100"_s << 1;
     QTest::newRow("line too short") << header + u"x\r\nx\tRO3"_s << 1;
-    QTest::newRow("names missing: first column")
-        << u"a\tb\r\nRO1\tx\r\nRO2\tx"_s << 2;
-    QTest::newRow("a name twice: the later column")
-        << u"theirref\ttheirref\r\nA\tB\r\nA\tC"_s << 2;
+    QTest::newRow("names missing: first column") << u"a\tb\r\nRO1\tx\r\nRO2\tx"_s << 2;
+    QTest::newRow("a name twice: the later column") << u"theirref\ttheirref\r\nA\tB\r\nA\tC"_s << 2;
 }
 
 void TestMoneyWorksSource::countJobReferences()
@@ -234,9 +231,9 @@ void TestMoneyWorksSource::periodEnd()
     QCOMPARE(loadSettings(workspace.context()), QString());
     QCOMPARE(connectMainDatabase(workspace.context()), QString());
     workspace.context().setNumberFormat(m_numbers);
-    workspace.context().settings().accFilePath = u"http://127.0.0.1:%1/"_s.arg(m_simulator.port())
-                                                 + QString::fromLatin1(
-                                                     QUrl::toPercentEncoding(Document));
+    workspace.context().settings().accFilePath =
+        u"http://127.0.0.1:%1/"_s.arg(m_simulator.port()) +
+        QString::fromLatin1(QUrl::toPercentEncoding(Document));
     workspace.context().settings().accFileUser = u"Admin"_s;
     workspace.context().settings().accFilePass = u"s3cret"_s;
     QSqlQuery(workspace.context().mainDatabase().database())

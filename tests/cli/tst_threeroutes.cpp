@@ -1,0 +1,247 @@
+// Veltrix — KPI dashboard for small businesses.
+// One ledger, three ways in: the SQLite company file, the MYOB SQL texts over ODBC (PostgreSQL
+// standing in for the MYOB driver) and MoneyWorks over REST (veltrix-mw-sim). Every Field must
+// come out the same.
+
+#include "simulatorprocess.h"
+
+#include "app/settings.h"
+#include "app/settingsstore.h"
+#include "cipher/passwordcipher.h"
+#include "database/sqliteconnection.h"
+#include "sources/companyfile.h"
+
+#include <QDir>
+#include <QFile>
+#include <QProcess>
+#include <QSqlQuery>
+#include <QSqlRecord>
+#include <QTcpServer>
+#include <QTemporaryDir>
+#include <QTest>
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+const QString Range[] = {u"--from"_s, u"2025-07"_s, u"--to"_s, u"2026-06"_s};
+
+int freePort()
+{
+    QTcpServer probe;
+    probe.listen(QHostAddress::LocalHost);
+    return probe.serverPort();
+}
+
+QString psqlodbcDriver()
+{
+    for (const QString &candidate : QDir(u"/usr/lib"_s).entryList({u"*-linux-gnu"_s}, QDir::Dirs)) {
+        const QString path = u"/usr/lib/"_s + candidate + u"/odbc/psqlodbcw.so"_s;
+        if (QFileInfo::exists(path))
+            return path;
+    }
+    return {};
+}
+
+} // namespace
+
+class TestThreeRoutes : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void initTestCase();
+    void cleanupTestCase();
+    void everyRouteGivesTheSameFigures();
+
+private:
+    struct Run
+    {
+        int exitCode = -1;
+        QStringList lines;
+        QString err;
+    };
+    Run produce(const QString &settingsFile);
+    bool loadLedgerIntoPostgres(QString *problem);
+    QString writeSettings(const QString &name, const QHash<QString, QString> &changes);
+
+    QTemporaryDir m_dir;
+    QString m_demo;
+    QString m_pgFolder;
+    int m_pgPort = 0;
+    QProcessEnvironment m_environment = QProcessEnvironment::systemEnvironment();
+    SimulatorProcess m_simulator;
+};
+
+void TestThreeRoutes::initTestCase()
+{
+    m_demo = m_dir.filePath(u"demo"_s);
+    m_environment.insert(u"XDG_CONFIG_HOME"_s, m_dir.filePath(u"config"_s));
+    m_environment.insert(u"XDG_DATA_HOME"_s, m_dir.filePath(u"data"_s));
+    QProcess makeDemo;
+    makeDemo.setProcessEnvironment(m_environment);
+    makeDemo.start(QStringLiteral(VELTRIX_CLI), {u"make-demo"_s, m_demo});
+    QVERIFY(makeDemo.waitForFinished(120000));
+    QCOMPARE(makeDemo.exitCode(), 0);
+
+    // PostgreSQL must be there: a missing server is a failure, never a silent skip.
+    m_pgPort = freePort();
+    QProcess cluster;
+    cluster.start(QStringLiteral(VELTRIX_PGCLUSTER), {u"start"_s, QString::number(m_pgPort)});
+    QVERIFY(cluster.waitForFinished(120000));
+    QVERIFY2(cluster.exitCode() == 0,
+             qPrintable(u"PostgreSQL could not be started: "_s +
+                        QString::fromUtf8(cluster.readAllStandardError())));
+    m_pgFolder = QString::fromUtf8(cluster.readAllStandardOutput()).trimmed();
+
+    m_environment.insert(u"PGHOST"_s, u"127.0.0.1"_s);
+    m_environment.insert(u"PGPORT"_s, QString::number(m_pgPort));
+    m_environment.insert(u"PGUSER"_s, u"postgres"_s);
+    m_environment.insert(u"PGDATABASE"_s, u"veltrix"_s);
+    QString problem;
+    QVERIFY2(loadLedgerIntoPostgres(&problem), qPrintable(problem));
+
+    // The psqlODBC driver, registered under a MYOB driver name in a private odbcinst.ini.
+    const QString driver = psqlodbcDriver();
+    QVERIFY2(!driver.isEmpty(), "the psqlODBC driver (odbc-postgresql) is not installed");
+    QFile odbcinst(m_dir.filePath(u"odbcinst.ini"_s));
+    QVERIFY(odbcinst.open(QIODevice::WriteOnly));
+    odbcinst.write("[MYOAU0901]\nDescription=PostgreSQL standing in for MYOB\nDriver=" +
+                   driver.toUtf8() + "\n");
+    odbcinst.close();
+    m_environment.insert(u"ODBCSYSINI"_s, m_dir.path());
+
+    QVERIFY2(m_simulator.start({u"--ledger"_s, m_demo + u"/Harbour Panel & Paint.moneyworks"_s,
+                                u"--document"_s, u"Harbour Panel & Paint.moneyworks"_s, u"--user"_s,
+                                u"Admin"_s, u"--password"_s, u"demo"_s, u"--period-end"_s,
+                                u"2026-11-30"_s}),
+             qPrintable(m_simulator.problem()));
+}
+
+void TestThreeRoutes::cleanupTestCase()
+{
+    if (!m_pgFolder.isEmpty()) {
+        QProcess::execute(QStringLiteral(VELTRIX_PGCLUSTER), {u"stop"_s, m_pgFolder});
+    }
+}
+
+bool TestThreeRoutes::loadLedgerIntoPostgres(QString *problem)
+{
+    SqliteConnection ledger;
+    if (const auto error = CompanyFile::open(ledger, m_demo + u"/Harbour Panel & Paint.myo"_s)) {
+        *problem = error->description;
+        return false;
+    }
+    const struct
+    {
+        QString table;
+        QString columns;
+    } tables[] = {
+        {u"Accounts"_s, u"AccountID, AccountNumber, AccountName"_s},
+        {u"JournalRecords"_s, u"JournalRecordID, AccountID, TransactionDate, TaxExclusiveAmount"_s},
+        {u"Sales"_s, u"SaleID, Date, InvoiceNumber"_s},
+    };
+    QString script = uR"(
+CREATE DATABASE veltrix;
+\c veltrix
+CREATE TABLE Accounts (AccountID integer PRIMARY KEY, AccountNumber text, AccountName text);
+CREATE TABLE JournalRecords (JournalRecordID integer PRIMARY KEY, AccountID integer,
+  TransactionDate date, TaxExclusiveAmount numeric(14,2));
+CREATE TABLE Sales (SaleID integer PRIMARY KEY, Date date, InvoiceNumber text);
+)"_s;
+    for (const auto &table : tables) {
+        QFile file(m_dir.filePath(table.table + u".tsv"_s));
+        if (!file.open(QIODevice::WriteOnly)) {
+            *problem = file.errorString();
+            return false;
+        }
+        QSqlQuery query(ledger.database());
+        query.exec(u"SELECT "_s + table.columns + u" FROM "_s + table.table);
+        while (query.next()) {
+            QStringList cells;
+            for (int i = 0; i < query.record().count(); ++i)
+                cells << query.value(i).toString().replace(u'\t', u' ');
+            file.write((cells.join(u'\t') + u'\n').toUtf8());
+        }
+        script += u"\\copy "_s + table.table + u" ("_s + table.columns + u") FROM '"_s +
+                  file.fileName() + u"'\n"_s;
+    }
+    script += u"CREATE INDEX ON JournalRecords (AccountID, TransactionDate);\nANALYZE;\n"_s;
+
+    QProcess psql;
+    QProcessEnvironment environment = m_environment;
+    environment.insert(u"PGDATABASE"_s, u"postgres"_s);
+    psql.setProcessEnvironment(environment);
+    psql.start(u"psql"_s, {u"-q"_s, u"-v"_s, u"ON_ERROR_STOP=1"_s});
+    psql.write(script.toUtf8());
+    psql.closeWriteChannel();
+    if (!psql.waitForFinished(300000) || psql.exitCode() != 0) {
+        *problem = u"psql: "_s + QString::fromUtf8(psql.readAllStandardError());
+        return false;
+    }
+    return true;
+}
+
+QString TestThreeRoutes::writeSettings(const QString &name, const QHash<QString, QString> &changes)
+{
+    const QString path = m_dir.filePath(name);
+    QFile::remove(path);
+    QFile::copy(m_demo + u"/settings.ini"_s, path);
+    SettingsStore store(path);
+    for (auto it = changes.cbegin(); it != changes.cend(); ++it)
+        store.writeSetting(it.key(), it.value());
+    return path;
+}
+
+TestThreeRoutes::Run TestThreeRoutes::produce(const QString &settingsFile)
+{
+    QProcess process;
+    process.setProcessEnvironment(m_environment);
+    QStringList arguments{u"produce"_s, u"--settings"_s, settingsFile,  u"--user"_s,
+                          u"manager"_s, u"--password"_s, u"manager1"_s, u"--compare"_s,
+                          u"years"_s,   u"--count"_s,    u"2"_s};
+    for (const QString &part : Range)
+        arguments << part;
+    process.start(QStringLiteral(VELTRIX_CLI), arguments);
+    Run run;
+    if (!process.waitForFinished(300000))
+        return run;
+    run.exitCode = process.exitCode();
+    run.lines = QString::fromUtf8(process.readAllStandardOutput()).split(u'\n', Qt::SkipEmptyParts);
+    run.err = QString::fromUtf8(process.readAllStandardError());
+    return run;
+}
+
+void TestThreeRoutes::everyRouteGivesTheSameFigures()
+{
+    const Run companyFile = produce(writeSettings(u"sqlite.ini"_s, {}));
+    const Run odbc = produce(writeSettings(u"odbc.ini"_s, {{u"AccFileDriver"_s, u"MYOAU0901"_s},
+                                                           {u"AccFilePath"_s, u"veltrix"_s},
+                                                           {u"AccFileUser"_s, u"postgres"_s}}));
+    const Run moneyWorks = produce(writeSettings(
+        u"moneyworks.ini"_s,
+        {{u"AccPackage"_s, u"MoneyWorks"_s},
+         {u"AccFilePath"_s, m_simulator.address(u"Harbour Panel & Paint.moneyworks"_s)},
+         {u"AccFileUser"_s, u"Admin"_s},
+         {u"AccFilePass"_s, PasswordCipher().encryptText(u"demo"_s, Settings::PasswordKey)}}));
+
+    for (const Run *run : {&companyFile, &odbc, &moneyWorks}) {
+        QVERIFY2(run->exitCode == 0, qPrintable(run->err));
+        QVERIFY2(run->err.isEmpty(), qPrintable(run->err));
+        QCOMPARE(run->lines.size(), 1 + 3 * 123);
+    }
+    // Something real was read: total sales of the first slot.
+    const auto totalSales =
+        std::find_if(companyFile.lines.cbegin(), companyFile.lines.cend(),
+                     [](const QString &line) { return line.startsWith(u"0,79,"_s); });
+    QVERIFY(totalSales != companyFile.lines.cend());
+    QVERIFY(totalSales->contains(u"$ 3,"_s));
+
+    for (int i = 0; i < companyFile.lines.size(); ++i) {
+        QCOMPARE(odbc.lines.at(i), companyFile.lines.at(i));
+        QCOMPARE(moneyWorks.lines.at(i), companyFile.lines.at(i));
+    }
+}
+
+QTEST_GUILESS_MAIN(TestThreeRoutes)
+#include "tst_threeroutes.moc"
