@@ -6,6 +6,7 @@
 #include "app/settingsstore.h"
 
 #include <QDir>
+#include <QFileInfo>
 #include <QTextStream>
 
 using namespace Qt::StringLiterals;
@@ -41,6 +42,31 @@ int makeDemo(const QStringList &arguments)
     for (const DemoWorkspace::DemoUser &user : DemoWorkspace::users())
         out << "  " << user.name << " / " << user.password;
     out << Qt::endl;
+    return 0;
+}
+
+int useDemo(const QStringList &arguments)
+{
+    const QString package = arguments.value(1, u"myob"_s).toLower();
+    if (arguments.isEmpty() || arguments.size() > 2
+        || (package != u"myob"_s && package != u"moneyworks"_s)) {
+        QTextStream(stderr) << "usage: veltrix-cli use-demo DIR [myob|moneyworks]" << Qt::endl;
+        return 2;
+    }
+    const QString folder = QDir(arguments.first()).absolutePath();
+    if (!QFileInfo::exists(QDir(folder).filePath(u"main.db"_s))) {
+        QTextStream(stderr) << "No demo workspace in " << folder
+                            << "; make one with veltrix-cli make-demo" << Qt::endl;
+        return 1;
+    }
+    SettingsStore own;
+    if (package == u"moneyworks"_s)
+        DemoWorkspace::configureMoneyWorks(own, folder);
+    else
+        DemoWorkspace::configure(own, folder);
+    QTextStream(stdout) << "Your settings (" << own.fileName() << ") now read the demo shop "
+                        << (package == u"moneyworks"_s ? "through MoneyWorks" : "as MYOB")
+                        << "." << Qt::endl;
     return 0;
 }
 

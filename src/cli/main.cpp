@@ -32,6 +32,8 @@ const QList<Verb> &verbs()
          PasswordVerbs::decryptPassword},
         {u"make-demo"_s, u"DIR [--use]"_s,
          u"write a demo workspace (database, company file, settings)"_s, DemoVerb::makeDemo},
+        {u"use-demo"_s, u"DIR [myob|moneyworks]"_s,
+         u"point your own settings at a demo workspace"_s, DemoVerb::useDemo},
         {u"produce"_s,
          u"--from YYYY-MM --to YYYY-MM --user NAME --password PW [--settings FILE] "
          u"[--compare years|periods --count N] [--format csv|json]"_s,

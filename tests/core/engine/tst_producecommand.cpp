@@ -29,6 +29,7 @@ private Q_SLOTS:
     void invalidRangeIsRefused();
     void noSourceAndNoFile();
     void unreadableCompanyFileIsReported();
+    void moneyWorksWithoutDocumentOrFile();
 
 private:
     bool start()
@@ -153,6 +154,17 @@ void TestProduceCommand::unreadableCompanyFileIsReported()
     QCOMPARE(m_workspace->prompter().messages().size(), 1);
     QVERIFY(m_workspace->prompter().messages().first().title.startsWith(u"Produce Error "_s));
     QVERIFY(!m_workspace->prompter().isBusy());
+}
+
+void TestProduceCommand::moneyWorksWithoutDocumentOrFile()
+{
+    m_workspace->store().writeSetting(u"AccPackage"_s, u"MoneyWorks"_s);
+    m_workspace->store().writeSetting(u"AccFilePath"_s, QString());
+    QVERIFY(start());
+    QCOMPARE(ProduceCommand(m_workspace->context()).produce({1, 2008, 1, 2008}), Outcome::NoSource);
+    QVERIFY(m_workspace->prompter().messages().last().text.startsWith(
+        u"There is no running instance of MoneyWorks and your primary Account data file has not "
+        u"been specified!"_s));
 }
 
 QTEST_GUILESS_MAIN(TestProduceCommand)
