@@ -48,8 +48,8 @@ int makeDemo(const QStringList &arguments)
 int useDemo(const QStringList &arguments)
 {
     const QString package = arguments.value(1, u"myob"_s).toLower();
-    if (arguments.isEmpty() || arguments.size() > 2
-        || (package != u"myob"_s && package != u"moneyworks"_s)) {
+    if (arguments.isEmpty() || arguments.size() > 2 ||
+        (package != u"myob"_s && package != u"moneyworks"_s)) {
         QTextStream(stderr) << "usage: veltrix-cli use-demo DIR [myob|moneyworks]" << Qt::endl;
         return 2;
     }
@@ -65,8 +65,8 @@ int useDemo(const QStringList &arguments)
     else
         DemoWorkspace::configure(own, folder);
     QTextStream(stdout) << "Your settings (" << own.fileName() << ") now read the demo shop "
-                        << (package == u"moneyworks"_s ? "through MoneyWorks" : "as MYOB")
-                        << "." << Qt::endl;
+                        << (package == u"moneyworks"_s ? "through MoneyWorks" : "as MYOB") << "."
+                        << Qt::endl;
     return 0;
 }
 

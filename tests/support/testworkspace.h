@@ -4,9 +4,12 @@
 #include "app/appcontext.h"
 #include "app/recordingprompter.h"
 #include "app/settingsstore.h"
+#include "database/sqliteconnection.h"
 
 #include <QDir>
 #include <QFile>
+#include <QFileInfo>
+#include <QSqlQuery>
 #include <QTemporaryDir>
 
 #include <memory>
@@ -42,6 +45,25 @@ public:
         store().writeSetting(QStringLiteral("AccPackage"), package);
         store().writeSetting(QStringLiteral("AccFileDriver"), QStringLiteral("SQLite"));
         return QFile::copy(QStringLiteral(VELTRIX_NEW_DB), appFolder() + QStringLiteral("new.db"));
+    }
+
+    // main.db in place (made from the template) with one Config row changed, as another copy or
+    // an administrator might have left it.
+    bool setConfigRow(int id, const QString &value)
+    {
+        if (!QFileInfo::exists(mainDatabase())) {
+            if (!QFile::copy(QStringLiteral(VELTRIX_NEW_DB), mainDatabase()))
+                return false;
+            QFile::setPermissions(mainDatabase(), QFileDevice::ReadOwner | QFileDevice::WriteOwner);
+        }
+        SqliteConnection connection;
+        if (connection.open(mainDatabase()))
+            return false;
+        QSqlQuery query(connection.database());
+        query.prepare(QStringLiteral("UPDATE Config SET Value = ? WHERE ID = ?"));
+        query.addBindValue(value);
+        query.addBindValue(id);
+        return query.exec();
     }
 
 private:

@@ -3,6 +3,7 @@
 
 #include "errorreporter.h"
 #include "prompter.h"
+#include "texttrim.h"
 
 #include <QDir>
 #include <QFile>
@@ -22,17 +23,6 @@ const auto LineEnd = u"\r\n"_s;
 bool isSeparator(QChar c)
 {
     return c == u'\\' || c == u'/';
-}
-
-QString trimmedOfSpaces(const QString &text)
-{
-    qsizetype first = 0;
-    qsizetype last = text.size();
-    while (first < last && text.at(first) == u' ')
-        ++first;
-    while (last > first && text.at(last - 1) == u' ')
-        --last;
-    return text.mid(first, last - first);
 }
 
 bool isLink(const QFileInfo &info)

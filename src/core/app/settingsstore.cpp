@@ -1,24 +1,11 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "settingsstore.h"
 
+#include "texttrim.h"
+
 #include <QSettings>
 
 using namespace Qt::StringLiterals;
-
-namespace {
-
-QString trimSpaces(const QString &text)
-{
-    qsizetype first = 0;
-    qsizetype last = text.size();
-    while (first < last && text.at(first) == u' ')
-        ++first;
-    while (last > first && text.at(last - 1) == u' ')
-        --last;
-    return text.mid(first, last - first);
-}
-
-} // namespace
 
 SettingsStore::SettingsStore()
 #ifdef Q_OS_WIN
@@ -54,7 +41,7 @@ QString SettingsStore::readSetting(const QString &valueName, const QString &key,
         text.chop(1);
     if (text.size() > MaxValueLength)
         text.clear();
-    text = trimSpaces(text);
+    text = trimmedOfSpaces(text);
     return text.isEmpty() ? defaultValue : text;
 }
 

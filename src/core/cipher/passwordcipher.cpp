@@ -6,6 +6,8 @@
 #include "keystream.h"
 #include "windows1252.h"
 
+#include "app/texttrim.h"
+
 #include <QRandomGenerator>
 
 using namespace Qt::StringLiterals;
@@ -15,20 +17,6 @@ namespace {
 // Long enough that a stored password always stays on one line.
 constexpr int ArmourLineLength = 9999;
 constexpr int FooterSize = 2;
-
-QString trimmedOfBlanks(const QString &text)
-{
-    const auto isBlank = [](QChar c) {
-        return c == u' ' || c == u'\t' || c == u'\r' || c == u'\n';
-    };
-    qsizetype first = 0;
-    qsizetype last = text.size();
-    while (first < last && isBlank(text.at(first)))
-        ++first;
-    while (last > first && isBlank(text.at(last - 1)))
-        --last;
-    return text.mid(first, last - first);
-}
 
 } // namespace
 
@@ -59,7 +47,7 @@ QString PasswordCipher::encryptText(const QString &text, const QString &key,
 QString PasswordCipher::decryptText(const QString &stored, const QString &key)
 {
     setError(NoError);
-    const QString trimmed = trimmedOfBlanks(stored);
+    const QString trimmed = trimmedOf(stored, u" \t\r\n");
     std::optional<QByteArray> plain;
     if (trimmed.isEmpty())
         setError(NoText);

@@ -91,16 +91,8 @@ void TestStartupShutdown::outcomes()
     TestWorkspace workspace;
     if (configure)
         QVERIFY(workspace.configure());
-    if (!requiredVersion.isEmpty()) {
-        QVERIFY(QFile::copy(QStringLiteral(VELTRIX_NEW_DB), workspace.mainDatabase()));
-        QFile::setPermissions(workspace.mainDatabase(),
-                              QFileDevice::ReadOwner | QFileDevice::WriteOwner);
-        SqliteConnection connection;
-        QCOMPARE(connection.open(workspace.mainDatabase()), std::nullopt);
-        QVERIFY(
-            QSqlQuery(connection.database())
-                .exec(u"UPDATE Config SET Value = '"_s + requiredVersion + u"' WHERE ID = 2"_s));
-    }
+    if (!requiredVersion.isEmpty())
+        QVERIFY(workspace.setConfigRow(2, requiredVersion));
     const StartupOutcome outcome = runStartupSequence(workspace.context());
     QCOMPARE(outcome.message, message);
     QCOMPARE(outcome.failed, !message.isEmpty());
@@ -112,15 +104,7 @@ void TestStartupShutdown::failedStartLeavesNoConnection()
 {
     TestWorkspace workspace;
     QVERIFY(workspace.configure());
-    QVERIFY(QFile::copy(QStringLiteral(VELTRIX_NEW_DB), workspace.mainDatabase()));
-    QFile::setPermissions(workspace.mainDatabase(),
-                          QFileDevice::ReadOwner | QFileDevice::WriteOwner);
-    {
-        SqliteConnection connection;
-        QCOMPARE(connection.open(workspace.mainDatabase()), std::nullopt);
-        QVERIFY(
-            QSqlQuery(connection.database()).exec(u"UPDATE Config SET Value='1.0' WHERE ID=1"_s));
-    }
+    QVERIFY(workspace.setConfigRow(1, u"1.0"_s));
     const StartupOutcome outcome = runStartupSequence(workspace.context());
     QVERIFY(outcome.failed);
     QVERIFY(outcome.updateNeeded);

@@ -71,15 +71,7 @@ void TestLoadingWindow::updateStateOffersUpdate()
 {
     TestWorkspace workspace;
     QVERIFY(workspace.configure());
-    QVERIFY(QFile::copy(QStringLiteral(VELTRIX_NEW_DB), workspace.mainDatabase()));
-    QFile::setPermissions(workspace.mainDatabase(),
-                          QFileDevice::ReadOwner | QFileDevice::WriteOwner);
-    {
-        SqliteConnection connection;
-        QCOMPARE(connection.open(workspace.mainDatabase()), std::nullopt);
-        QVERIFY(
-            QSqlQuery(connection.database()).exec(u"UPDATE Config SET Value='1.4' WHERE ID=1"_s));
-    }
+    QVERIFY(workspace.setConfigRow(1, u"1.4"_s));
     LoadingWindow window(workspace.context(), workspace.prompter());
     window.show();
     QVERIFY(QTest::qWaitForWindowExposed(&window));
