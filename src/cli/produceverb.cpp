@@ -10,7 +10,9 @@
 #include "engine/rangeloader.h"
 #include "users/loginservice.h"
 #include "views/comparisonranges.h"
+#include "views/gridmodel.h"
 #include "views/kpievaluation.h"
+#include "views/tabviewbuilder.h"
 
 #include <QCommandLineParser>
 #include <QJsonArray>
@@ -59,16 +61,22 @@ QString csvField(const QString &text)
 
 using Record = QList<QString>;
 
-// One record per line of the "All" tab the user may see, for the current slot.
+// One record per line of the "All" tab the user may see, for the slot: the grid the main
+// window would show, with the benchmark figures beside it.
 QList<Record> recordsOfSlot(AppContext &context, int slot)
 {
+    GridModel grid;
+    TabViewBuilder::addMainColumns(grid);
+    TabViewBuilder(context, grid).buildSlotView(0, slot);
+    const int valueColumn = grid.columnIndex(u"value"_s);
+
     QList<Record> records;
     const PeriodDataSet &data = context.periodDataSet();
     const NumberFormat &numbers = context.numberFormat();
     RecordSet &fields = context.mainDatabase().fieldsRecordset();
     if (fields.moveFirst())
         return records;
-    for (; !fields.eof(); fields.moveNext()) {
+    for (int row = 1; !fields.eof(); fields.moveNext(), ++row) {
         const qint64 id = fields.value(u"ID"_s).toLongLong();
         const int type = fields.value(u"Type"_s).toInt();
         if (!LoginService::maySee(context.loginState(), id, type))
@@ -89,7 +97,7 @@ QList<Record> recordsOfSlot(AppContext &context, int slot)
                           fields.value(u"Order"_s).toString(),
                           fields.value(u"Label"_s).toString(),
                           QString::number(type),
-                          KpiEvaluation::valueCellText(type, id, data, numbers),
+                          grid.cellText(row, valueColumn),
                           heading ? QString() : numberText(actual),
                           heading ? QString() : numberText(data.getFieldAbs(id)),
                           benchmark,

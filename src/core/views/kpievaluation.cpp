@@ -2,7 +2,6 @@
 #include "kpievaluation.h"
 
 #include "app/numberformat.h"
-#include "engine/perioddataset.h"
 #include "engine/rounding.h"
 
 using namespace Qt::StringLiterals;
@@ -19,11 +18,6 @@ double elementNumber(QString element, QChar marker, const NumberFormat &numbers)
 double oneDecimal(double value)
 {
     return Rounding::halfAwayFromZero(value, 1);
-}
-
-QString plainNumber(double value, const NumberFormat &numbers)
-{
-    return numbers.locale().toString(value, 'g', QLocale::FloatingPointShortest);
 }
 
 } // namespace
@@ -58,27 +52,6 @@ Result evaluateBenchmark(const QString &benchmark, double actual, const NumberFo
     result.band = firstVariant >= 0 ? Green : (variant >= 0 ? Yellow : Red);
     result.variant = firstVariant;
     return result;
-}
-
-QString valueCellText(int type, qint64 fieldId, const PeriodDataSet &data,
-                      const NumberFormat &numbers)
-{
-    if (type == 1)
-        return {};
-    const int pos = PeriodDataSet::findFieldPos(data.current().fieldIds, fieldId);
-    const QString magnitude = pos > 0 ? data.current().fieldAbs.value(pos - 1) : QString();
-    switch (type) {
-    case 3:
-        if (numbers.toNumber(magnitude) != 0.0)
-            return plainNumber(data.getFieldValue(fieldId), numbers) + u'%';
-        return magnitude;
-    case 4:
-        return magnitude.isEmpty() ? QString() : plainNumber(numbers.toNumber(magnitude), numbers);
-    default:
-        // Amounts show their size; the sign is told by colour.
-        return numbers.formatMoney(magnitude.isEmpty() ? QVariant(QString())
-                                                       : QVariant(data.getFieldAbs(fieldId)));
-    }
 }
 
 QString benchmarkCellText(const QString &benchmark)

@@ -4,7 +4,6 @@
 #include <QString>
 
 class NumberFormat;
-class PeriodDataSet;
 
 // How a percentage KPI stands against its benchmark. The benchmark text holds the optimal
 // ("<30": good at 30 or less, ">45": good at 45 or more) and, after a comma, the limit beyond
@@ -26,12 +25,6 @@ struct Result
 // benchmark changes nothing.
 Result evaluateBenchmark(const QString &benchmark, double actual, const NumberFormat &numbers,
                          Result result = {});
-
-// The text of a KPI grid's value cell for a Field of the given type, from the current slot:
-// money with "$ " for account and computed amounts, the signed percentage for type 3, the
-// figure itself for counts, nothing for headings or absent Fields.
-QString valueCellText(int type, qint64 fieldId, const PeriodDataSet &data,
-                      const NumberFormat &numbers);
 
 // The benchmark cell: the optimal element followed by "%".
 QString benchmarkCellText(const QString &benchmark);

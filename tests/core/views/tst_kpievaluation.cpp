@@ -17,8 +17,6 @@ private Q_SLOTS:
     void evaluateBenchmark_data();
     void evaluateBenchmark();
     void nothingToEvaluateKeepsTheCallersValues();
-    void valueCellText_data();
-    void valueCellText();
     void benchmarkCell();
     void comparisonRanges_data();
     void comparisonRanges();
@@ -79,40 +77,6 @@ void TestKpiEvaluation::nothingToEvaluateKeepsTheCallersValues()
         QCOMPARE(result.variant, 2.0);
         QCOMPARE(int(result.band), int(Yellow));
     }
-}
-
-void TestKpiEvaluation::valueCellText_data()
-{
-    QTest::addColumn<int>("type");
-    QTest::addColumn<qint64>("id");
-    QTest::addColumn<QString>("text");
-    QTest::newRow("heading") << 1 << qint64(72) << QString();
-    QTest::newRow("income account") << 2 << qint64(72) << u"$ 1,200.00"_s;
-    QTest::newRow("expense account shows its size") << 2 << qint64(81) << u"$ 450.50"_s;
-    QTest::newRow("account of zero") << 2 << qint64(83) << u"$ -"_s;
-    QTest::newRow("percentage") << 3 << qint64(16) << u"-12.3%"_s;
-    QTest::newRow("percentage of zero") << 3 << qint64(92) << QString();
-    QTest::newRow("count") << 4 << qint64(97) << u"1,234"_s;
-    QTest::newRow("hours") << 4 << qint64(62) << u"12.5"_s;
-    QTest::newRow("computed money, negative") << 5 << qint64(110) << u"$ 2,500.75"_s;
-    QTest::newRow("absent Field") << 5 << qint64(999) << QString();
-}
-
-void TestKpiEvaluation::valueCellText()
-{
-    QFETCH(int, type);
-    QFETCH(qint64, id);
-    QFETCH(QString, text);
-    PeriodDataSet data(m_numbers);
-    data.storeAccountFigure(72, -1200.0, 2);
-    data.storeAccountFigure(81, 450.5, 2);
-    data.storeAccountFigure(83, 0.0, 2);
-    data.storeFieldValue(16, -0.123, 1);
-    data.storeFieldValue(92, 0.0, 1);
-    data.storeFieldValue(97, 1234, 3);
-    data.storeFieldValue(62, 12.5, 4);
-    data.storeFieldValue(110, -2500.75, 0);
-    QCOMPARE(KpiEvaluation::valueCellText(type, id, data, m_numbers), text);
 }
 
 void TestKpiEvaluation::benchmarkCell()

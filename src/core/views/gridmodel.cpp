@@ -1,0 +1,132 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "gridmodel.h"
+
+#include <QDateTime>
+
+#include <algorithm>
+
+GridModel::GridModel(QObject *parent)
+    : QObject(parent)
+{}
+
+void GridModel::addColumn(const QString &key, const QString &header, int alignment, int width,
+                          bool visible)
+{
+    m_columns.append({key, header, alignment, width, visible, SortText, {}, {}});
+    for (Row &row : m_rows)
+        row.cells.append(Cell());
+    changed();
+}
+
+int GridModel::columnIndex(const QString &key) const
+{
+    for (int i = 0; i < m_columns.size(); ++i) {
+        if (m_columns[i].key.compare(key, Qt::CaseInsensitive) == 0)
+            return i + 1;
+    }
+    return 0;
+}
+
+void GridModel::clear()
+{
+    m_rows.clear();
+    m_selectedRow = 0;
+    changed();
+}
+
+int GridModel::addRow()
+{
+    m_rows.append({QList<Cell>(m_columns.size()), true});
+    changed();
+    return rowCount();
+}
+
+void GridModel::removeRow(int row)
+{
+    m_rows.removeAt(row - 1);
+    if (m_selectedRow == row)
+        m_selectedRow = 0;
+    else if (m_selectedRow > row)
+        --m_selectedRow;
+    changed();
+}
+
+void GridModel::setRowVisible(int row, bool visible)
+{
+    m_rows[row - 1].visible = visible;
+    changed();
+}
+
+GridModel::Cell &GridModel::editCell(int row, int column)
+{
+    changed();
+    return m_rows[row - 1].cells[column - 1];
+}
+
+QString GridModel::cellText(int row, int column) const
+{
+    const QVariant &value = cell(row, column).value;
+    return value.isNull() ? QString() : value.toString();
+}
+
+void GridModel::setCellText(int row, int column, const QVariant &value)
+{
+    editCell(row, column).value = value;
+}
+
+void GridModel::setSelectedRow(int row)
+{
+    if (row == m_selectedRow)
+        return;
+    m_selectedRow = row;
+    Q_EMIT selectionChanged(row);
+}
+
+void GridModel::setRedraw(bool on)
+{
+    m_redraw = on;
+    if (on && m_pendingChange) {
+        m_pendingChange = false;
+        Q_EMIT contentChanged();
+    }
+}
+
+void GridModel::changed()
+{
+    if (m_redraw)
+        Q_EMIT contentChanged();
+    else
+        m_pendingChange = true;
+}
+
+void GridModel::sort(int column, bool ascending, int sortType)
+{
+    const auto key = [&](const Row &row) { return row.cells.at(column - 1).value; };
+    const auto less = [&](const Row &a, const Row &b) {
+        const QVariant left = key(a);
+        const QVariant right = key(b);
+        switch (sortType) {
+        case SortNumber:
+            return left.toDouble() < right.toDouble();
+        case SortDate:
+            return left.toDateTime() < right.toDateTime();
+        default:
+            return left.toString().compare(right.toString(), Qt::CaseInsensitive) < 0;
+        }
+    };
+    const int selected = m_selectedRow;
+    const Row selectedRow = selected > 0 ? m_rows.at(selected - 1) : Row();
+    std::stable_sort(m_rows.begin(), m_rows.end(), [&](const Row &a, const Row &b) {
+        return ascending ? less(a, b) : less(b, a);
+    });
+    if (selected > 0) {
+        // The selection follows its row.
+        for (int i = 0; i < m_rows.size(); ++i) {
+            if (m_rows[i].cells.constData() == selectedRow.cells.constData()) {
+                m_selectedRow = i + 1;
+                break;
+            }
+        }
+    }
+    changed();
+}

@@ -1,0 +1,153 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "kpigrid.h"
+
+#include "gridoperations.h"
+#include "kpievaluation.h"
+
+#include "app/numberformat.h"
+#include "app/prompter.h"
+#include "database/maindatabase.h"
+#include "database/recordoperations.h"
+#include "engine/perioddataset.h"
+
+using namespace Qt::StringLiterals;
+using namespace GridOperations;
+
+KpiGrid::KpiGrid(GridModel &grid, PeriodDataSet &data, MainDatabase &database, Prompter &prompter,
+                 const NumberFormat &numbers)
+    : m_grid(grid)
+    , m_data(data)
+    , m_database(database)
+    , m_prompter(prompter)
+    , m_numbers(numbers)
+{}
+
+QString KpiGrid::numberText(double value) const
+{
+    return m_numbers.locale().toString(value, 'g', QLocale::FloatingPointShortest);
+}
+
+void KpiGrid::fillValueColumn(const QString &valueKey, bool evaluate)
+{
+    m_valueColumn = m_grid.columnIndex(valueKey);
+    const PeriodDataSet::Slot &slot = m_data.current();
+    if (m_grid.rowCount() == 0 || slot.isEmpty() || m_valueColumn == 0)
+        return;
+    m_grid.setRedraw(false);
+    const int benchmarkColumn = m_grid.columnIndex(u"benchmark"_s);
+    const int typeColumn = m_grid.columnIndex(u"type"_s);
+    const int variantColumn = m_grid.columnIndex(u"variant"_s);
+    const int value = m_valueColumn;
+
+    for (int row = 1; row <= m_grid.rowCount(); ++row) {
+        m_grid.setRowVisible(row, false);
+        const qint64 id = m_grid.cellText(row, 1).toLongLong();
+        if (m_grid.cellText(row, 2) != u"1"_s) {
+            const int pos = slot.findFieldPos(id);
+            if (pos > 0)
+                m_grid.setCellText(row, value, slot.fieldAbs.at(pos - 1));
+        }
+        const QString type = m_grid.cellText(row, typeColumn);
+        const double signedValue = m_data.getFieldValue(id);
+        if (type == u"2"_s && signedValue != 0.0)
+            setCellStyle(m_grid, row, value, signedValue < 0 ? AccountBelow : AccountAbove, false);
+        if (type == u"3"_s && benchmarkColumn)
+            m_grid.setCellText(row, benchmarkColumn, m_grid.cellText(row, 3));
+        m_grid.editCell(row, value).alignment = GridModel::CellLeft;
+
+        if (type == u"1"_s) {
+            m_grid.setRowVisible(row, true);
+        } else if (type == u"2"_s) {
+            m_grid.setCellText(row, value, m_numbers.formatMoney(m_grid.cellText(row, value)));
+        } else if (type == u"3"_s) {
+            if (evaluate) {
+                evaluateGridRow(row, id);
+                setCellStyle(m_grid, row, value, Percentage, true);
+                if (benchmarkColumn) {
+                    setCellStyle(m_grid, row, benchmarkColumn, Percentage, false);
+                    m_grid.setCellText(
+                        row, benchmarkColumn,
+                        KpiEvaluation::benchmarkCellText(m_grid.cellText(row, benchmarkColumn)));
+                }
+                if (variantColumn && getCellNumber(m_grid, row, variantColumn, m_numbers) != 0.0) {
+                    m_grid.setCellText(row, variantColumn,
+                                       m_grid.cellText(row, variantColumn) + u'%');
+                }
+            }
+            if (getCellNumber(m_grid, row, value, m_numbers) != 0.0)
+                m_grid.setCellText(row, value, numberText(signedValue) + u'%');
+            m_grid.editCell(row, value).alignment = GridModel::CellCentre;
+        } else if (type == u"4"_s) {
+            if (signedValue < 0)
+                setCellStyle(m_grid, row, value, std::nullopt, true, NegativeText);
+            const QString stored = m_grid.cellText(row, value);
+            if (!stored.isEmpty())
+                m_grid.setCellText(row, value, numberText(m_numbers.toNumber(stored)));
+        } else {
+            if (signedValue < 0)
+                setCellStyle(m_grid, row, value, std::nullopt, true, NegativeText);
+            m_grid.setCellText(row, value, m_numbers.formatMoney(m_grid.cellText(row, value)));
+        }
+    }
+    m_grid.setRedraw(true);
+}
+
+void KpiGrid::evaluateGridRow(int row, qint64 fieldId)
+{
+    const double actual = m_data.getFieldValue(fieldId);
+    if (actual == 0.0)
+        return;
+    RecordSet &fields = m_database.fieldsRecordset();
+    const qint64 id = m_grid.cellText(row, 1).toLongLong();
+    if (!RecordOperations(m_database, m_prompter).findRecordById(fields, id)) {
+        m_prompter.message(u"Could not find record with ID "_s + QString::number(id),
+                           u"Benchmark Error"_s, Prompter::Icon::Exclamation);
+        return;
+    }
+    const KpiEvaluation::Result result =
+        KpiEvaluation::evaluateBenchmark(fields.value(u"Data"_s).toString(), actual, m_numbers);
+    const int variantColumn = m_grid.columnIndex(u"variant"_s);
+    if (variantColumn == 0)
+        return;
+    const QColor colours[] = {Red, Yellow, Green};
+    setCellStyle(m_grid, row, variantColumn, colours[std::min<int>(result.band, 2)], true);
+    m_grid.setCellText(row, variantColumn, numberText(result.variant));
+}
+
+void KpiGrid::computeAverages(int lastSlot)
+{
+    const int averageColumn = m_grid.columnIndex(u"average"_s);
+    const int typeColumn = m_grid.columnIndex(u"type"_s);
+    for (int row = 1; row <= m_grid.rowCount(); ++row) {
+        const qint64 id = m_grid.cellText(row, 1).toLongLong();
+        double sum = 0.0;
+        int count = 0;
+        double highest = 0.0;
+        int highestSlot = -1;
+        for (int s = 0; s <= lastSlot; ++s) {
+            m_data.setCurrentSlot(quint8(s));
+            const double v = m_data.getFieldAbs(id);
+            if (v != 0.0)
+                ++count;
+            sum += v;
+            if (v > highest) {
+                highest = v;
+                highestSlot = s;
+            }
+        }
+        if (highestSlot >= 0) {
+            const QString key =
+                highestSlot == 0 ? u"value"_s : u"value"_s + QString::number(highestSlot);
+            if (const int column = m_grid.columnIndex(key))
+                m_grid.editCell(row, column).back = Highest;
+        }
+        if (averageColumn == 0)
+            continue;
+        m_grid.editCell(row, averageColumn).back = AverageBack;
+        if (sum > 0.0) {
+            const int type = int(m_numbers.toNumber(m_grid.cellText(row, typeColumn)));
+            m_grid.setCellText(row, averageColumn,
+                               m_data.formatFieldValue(sum / count, type, false));
+        }
+    }
+}

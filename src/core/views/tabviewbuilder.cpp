@@ -1,0 +1,113 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "tabviewbuilder.h"
+
+#include "gridoperations.h"
+#include "kpigrid.h"
+
+#include "app/appcontext.h"
+#include "app/prompter.h"
+#include "users/loginservice.h"
+
+using namespace Qt::StringLiterals;
+using namespace GridOperations;
+
+namespace {
+const QColor RowBack(0xC0, 0xC0, 0xC0);
+const QColor LabelBack(0xF0, 0xF0, 0xF0);
+} // namespace
+
+TabViewBuilder::TabViewBuilder(AppContext &context, GridModel &grid)
+    : m_context(context)
+    , m_grid(grid)
+{}
+
+QStringList TabViewBuilder::tabCaptions()
+{
+    return {u"&All"_s,   u"&Summary"_s,       u"&Labour"_s,   u"&Parts"_s,
+            u"Pai&nt"_s, u"&Repair Orders"_s, u"&Financial"_s};
+}
+
+void TabViewBuilder::addMainColumns(GridModel &grid)
+{
+    grid.addColumn(u"id"_s, QString(), GridModel::AlignLeft, 0, true);
+    grid.addColumn(u"type"_s, QString(), GridModel::AlignLeft, 80, false);
+    grid.addColumn(u"data"_s, QString(), GridModel::AlignLeft, 80, false);
+    grid.addColumn(u"row"_s, u"Row"_s, GridModel::AlignLeft, 45, true);
+    grid.addColumn(u"label"_s, u"Field"_s, GridModel::AlignLeft, 250, true);
+    grid.addColumn(u"value"_s, u"Value"_s, GridModel::AlignCentre, 100, true);
+    grid.addColumn(u"benchmark"_s, u"Optimal %"_s, GridModel::AlignCentre, 80, true);
+    grid.addColumn(u"variant"_s, u"Variant"_s, GridModel::AlignCentre, 80, true);
+    setupGrid(grid);
+}
+
+void TabViewBuilder::fill(int tab)
+{
+    MainDatabase &database = m_context.mainDatabase();
+    RecordSet &records = tab == 0 ? database.fieldsRecordset() : database.tabRecordset(tab);
+    fillGrid(m_grid, records, false);
+    numberAndStyleRows();
+}
+
+void TabViewBuilder::buildSlotView(int tab, int slot)
+{
+    const BusyPointer busy(m_context.prompter());
+    fill(tab);
+    PeriodDataSet &data = m_context.periodDataSet();
+    data.setCurrentSlot(quint8(slot));
+    KpiGrid(m_grid, data, m_context.mainDatabase(), m_context.prompter(), m_context.numberFormat())
+        .fillValueColumn(u"value"_s, true);
+    applyUsersLines();
+}
+
+void TabViewBuilder::buildTabView(int tab, int pastCount)
+{
+    const BusyPointer busy(m_context.prompter());
+    fill(tab);
+    PeriodDataSet &data = m_context.periodDataSet();
+    KpiGrid kpis(m_grid, data, m_context.mainDatabase(), m_context.prompter(),
+                 m_context.numberFormat());
+    for (int p = 0; p <= pastCount; ++p) {
+        data.setCurrentSlot(quint8(p));
+        kpis.fillValueColumn(p == 0 ? u"value"_s : u"value"_s + QString::number(p), pastCount == 0);
+    }
+    applyUsersLines();
+}
+
+void TabViewBuilder::numberAndStyleRows()
+{
+    const int rowColumn = m_grid.columnIndex(u"row"_s);
+    const int labelColumn = m_grid.columnIndex(u"label"_s);
+    const int typeColumn = m_grid.columnIndex(u"type"_s);
+    int counter = 0;
+    for (int row = 1; row <= m_grid.rowCount(); ++row) {
+        ++counter;
+        setCellStyle(m_grid, row, rowColumn, RowBack, true);
+        setCellStyle(m_grid, row, labelColumn, LabelBack, false);
+        if (m_grid.cellText(row, typeColumn) == u"1"_s) {
+            setHeadingStyle(m_grid, row, rowColumn);
+            setHeadingStyle(m_grid, row, labelColumn);
+            m_grid.setCellText(row, labelColumn, m_grid.cellText(row, labelColumn).toUpper());
+            --counter;
+        } else {
+            m_grid.setCellText(row, rowColumn, QString::number(counter));
+        }
+    }
+}
+
+void TabViewBuilder::applyUsersLines()
+{
+    const LoginState &login = m_context.loginState();
+    if (login.currentUser.toLower() == LoginService::BuiltInUser) {
+        for (int row = 1; row <= m_grid.rowCount(); ++row)
+            m_grid.setRowVisible(row, true);
+        return;
+    }
+    const QStringList groups = login.currentUserFields.split(u'#');
+    for (const QString &group : groups) {
+        const QStringList ids = group.split(u',');
+        for (const QString &id : ids) {
+            if (const int row = findGridRow(m_grid, 1, id.trimmed()); row > 0)
+                m_grid.setRowVisible(row, true);
+        }
+    }
+}

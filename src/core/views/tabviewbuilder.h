@@ -1,0 +1,37 @@
+// Veltrix — KPI dashboard for small businesses.
+#pragma once
+
+#include <QStringList>
+
+class AppContext;
+class GridModel;
+
+// What a tab of the KPI views shows: its Fields as grid rows in order, numbered and styled,
+// with one value column per period and only the lines the logged-in user may see.
+class TabViewBuilder
+{
+public:
+    static constexpr int TabCount = 7; // "All" and the six tabs of the Fields table
+    static constexpr int SummaryTab = 1;
+
+    TabViewBuilder(AppContext &context, GridModel &grid);
+
+    // "&All", "&Summary", ...
+    static QStringList tabCaptions();
+    // The columns of the main window's KPI grid.
+    static void addMainColumns(GridModel &grid);
+
+    // pastCount is 0 in the main window, 1 to 4 in the comparison window.
+    void buildTabView(int tab, int pastCount);
+    // The main window's view of one period slot other than 0, for tools that list slots one
+    // after the other.
+    void buildSlotView(int tab, int slot);
+
+private:
+    void fill(int tab);
+    void numberAndStyleRows();
+    void applyUsersLines();
+
+    AppContext &m_context;
+    GridModel &m_grid;
+};
