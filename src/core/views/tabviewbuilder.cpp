@@ -6,6 +6,7 @@
 
 #include "app/appcontext.h"
 #include "app/prompter.h"
+#include "database/recordoperations.h"
 #include "users/loginservice.h"
 
 using namespace Qt::StringLiterals;
@@ -71,6 +72,27 @@ void TabViewBuilder::buildTabView(int tab, int pastCount)
         kpis.fillValueColumn(p == 0 ? u"value"_s : u"value"_s + QString::number(p), pastCount == 0);
     }
     applyUsersLines();
+}
+
+QList<TabViewBuilder::GraphBar> TabViewBuilder::graphBars(const GridModel &grid)
+{
+    QList<GraphBar> bars;
+    PeriodDataSet &data = m_context.periodDataSet();
+    data.setCurrentSlot(0);
+    MainDatabase &database = m_context.mainDatabase();
+    const RecordOperations records(database, m_context.prompter());
+    const int benchmarkColumn = grid.columnIndex(u"benchmark"_s);
+    for (int row = 1; benchmarkColumn && row <= grid.rowCount(); ++row) {
+        if (grid.cellText(row, benchmarkColumn).isEmpty())
+            continue;
+        const qint64 id = grid.cellText(row, 1).toLongLong();
+        const int pos = data.current().findFieldPos(id);
+        if (pos == 0 || !records.findRecordById(database.fieldsRecordset(), id))
+            continue;
+        bars << GraphBar{id, database.fieldsRecordset().value(u"Data"_s).toString(),
+                         data.getFieldAbs(id)};
+    }
+    return bars;
 }
 
 void TabViewBuilder::numberAndStyleRows()

@@ -21,6 +21,17 @@ public:
     // The columns of the main window's KPI grid.
     static void addMainColumns(GridModel &grid);
 
+    // One bar of the graph: a percentage Field with data in the current slot.
+    struct GraphBar
+    {
+        qint64 fieldId = 0;
+        QString benchmark;
+        double value = 0.0;
+    };
+
+    // The bars of the main window's graph, from the grid's rows with a benchmark, in order.
+    QList<GraphBar> graphBars(const GridModel &grid);
+
     // pastCount is 0 in the main window, 1 to 4 in the comparison window.
     void buildTabView(int tab, int pastCount);
     // The main window's view of one period slot other than 0, for tools that list slots one

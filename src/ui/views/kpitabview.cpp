@@ -1,0 +1,83 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "kpitabview.h"
+
+#include "grapharea.h"
+#include "gridview.h"
+#include "tooltippanel.h"
+
+#include "app/appcontext.h"
+#include "database/recordoperations.h"
+#include "views/gridoperations.h"
+#include "views/tabviewbuilder.h"
+
+#include <QLabel>
+#include <QVBoxLayout>
+
+using namespace Qt::StringLiterals;
+
+KpiTabView::KpiTabView(AppContext &context, QWidget *parent)
+    : QWidget(parent)
+    , m_context(context)
+    , m_caption(new QLabel(this))
+    , m_graph(new GraphArea(context.numberFormat(), this))
+    , m_gridView(new GridView(m_grid, this))
+    , m_tooltip(new TooltipPanel(this))
+{
+    m_caption->setObjectName(u"lblTab"_s);
+    QFont captionFont = m_caption->font();
+    captionFont.setBold(true);
+    captionFont.setPointSizeF(captionFont.pointSizeF() * 1.3);
+    m_caption->setFont(captionFont);
+    m_graph->setObjectName(u"picGraph"_s);
+    m_gridView->setObjectName(u"lstGrid"_s);
+    TabViewBuilder::addMainColumns(m_grid);
+
+    auto *layout = new QVBoxLayout(this);
+    layout->addWidget(m_caption);
+    layout->addWidget(m_graph);
+    layout->addWidget(m_gridView, 1);
+
+    connect(m_graph, &GraphArea::barFocused, this, &KpiTabView::selectField);
+    connect(m_gridView, &GridView::cellPicked, this, [this](int row, int column) {
+        if (column == m_grid.columnIndex(u"label"_s))
+            explainRow(row);
+    });
+}
+
+void KpiTabView::showTab(int tab)
+{
+    m_tab = tab;
+    m_caption->setText(TabViewBuilder::tabCaptions().value(tab).remove(u'&'));
+    m_gridView->hide();
+    TabViewBuilder builder(m_context, m_grid);
+    builder.buildTabView(tab, 0);
+    m_gridView->show();
+    if (tab == TabViewBuilder::SummaryTab) {
+        QList<GraphArea::BarSpec> bars;
+        for (const TabViewBuilder::GraphBar &bar : builder.graphBars(m_grid))
+            bars << GraphArea::BarSpec{bar.fieldId, bar.benchmark, bar.value};
+        m_graph->setBars(bars, false);
+    }
+    m_graph->setVisible(tab == TabViewBuilder::SummaryTab);
+}
+
+void KpiTabView::selectField(qint64 fieldId)
+{
+    m_grid.setSelectedRow(GridOperations::findGridRow(m_grid, 1, QString::number(fieldId)));
+    m_gridView->setFocus();
+}
+
+void KpiTabView::explainRow(int row)
+{
+    MainDatabase &database = m_context.mainDatabase();
+    RecordSet &fields = database.fieldsRecordset();
+    const qint64 id = m_grid.cellText(row, 1).toLongLong();
+    if (!RecordOperations(database, m_context.prompter()).findRecordById(fields, id))
+        return;
+    const QString message = fields.value(u"tooltip"_s).toString();
+    const QString title = m_grid.cellText(row, m_grid.columnIndex(u"label"_s));
+    const QRect cell = m_gridView->cellRect(row, m_grid.columnIndex(u"label"_s));
+    const QPoint underCell =
+        m_gridView->viewport()->mapTo(this, QPoint(cell.left(), cell.bottom() + 1));
+    m_tooltip->showToolTip(title, message, underCell);
+}
