@@ -6,6 +6,7 @@
 #include "database/configvalues.h"
 #include "database/maindatabase.h"
 #include "engine/cachefile.h"
+#include "users/usercounter.h"
 
 #include <QCoreApplication>
 #include <QTextStream>
@@ -42,6 +43,26 @@ int writeConfig(const QStringList &arguments)
     return failures + int(prompter.messages().size()) == 0 ? 0 : 1;
 }
 
+// count-users DATABASE up|down COUNT: logs in (up) or off (down) COUNT times, as copies do.
+int countUsers(const QStringList &arguments)
+{
+    MainDatabase database;
+    if (const auto error = database.connection().open(arguments[0])) {
+        QTextStream(stderr) << error->description << Qt::endl;
+        return 1;
+    }
+    UserCounter counter(database);
+    const bool up = arguments[1] == u"up"_s;
+    int failures = 0;
+    for (int i = 0; i < arguments[2].toInt(); ++i) {
+        if (const auto error = up ? counter.increment() : counter.decrement()) {
+            QTextStream(stderr) << error->number << ' ' << error->description << Qt::endl;
+            ++failures;
+        }
+    }
+    return failures == 0 ? 0 : 1;
+}
+
 // write-cache FILE: writes two different caches in turn, for ever, until killed.
 int writeCacheForever(const QStringList &arguments)
 {
@@ -72,6 +93,8 @@ int main(int argc, char *argv[])
     const QStringList arguments = QCoreApplication::arguments().mid(1);
     if (arguments.value(0) == u"write-config"_s && arguments.size() == 4)
         return writeConfig(arguments.mid(1));
+    if (arguments.value(0) == u"count-users"_s && arguments.size() == 4)
+        return countUsers(arguments.mid(1));
     if (arguments.value(0) == u"write-cache"_s && arguments.size() == 2)
         return writeCacheForever(arguments.mid(1));
     QTextStream(stderr) << "usage: veltrix-testhelper write-config DATABASE ID COUNT | "

@@ -1,0 +1,30 @@
+// Veltrix — KPI dashboard for small businesses.
+#pragma once
+
+#include "database/dberror.h"
+
+#include <optional>
+
+class MainDatabase;
+
+// The number of users logged in on all copies, kept as a whole number in Config row 4. Each
+// change is one statement in the database, so copies that log in or off at the same moment
+// never lose a count; the count never goes below 0.
+class UserCounter
+{
+public:
+    explicit UserCounter(MainDatabase &database)
+        : m_database(database)
+    {}
+
+    std::optional<DbError> increment();
+    // One less when above 0; a negative count becomes 0; 0 stays.
+    std::optional<DbError> decrement();
+    // The counter to 0 and a "Logoff" request to every copy, together.
+    std::optional<DbError> reset();
+
+private:
+    std::optional<DbError> execute(const QString &sql);
+
+    MainDatabase &m_database;
+};
