@@ -51,14 +51,14 @@ void GraphArea::setBars(const QList<BarSpec> &specs, bool compare)
 
     QList<qint64> ids;
     QList<int> heights;
-    for (const BarSpec &spec : specs) {
+    for (const BarSpec &wanted : specs) {
         auto *bar = new BarGraphItem(m_numbers, this);
-        bar->setTag(spec.fieldId);
-        bar->setOptimalString(spec.benchmark);
-        bar->setActualValue(spec.value);
+        bar->setTag(wanted.fieldId);
+        bar->setOptimalString(wanted.benchmark);
+        bar->setActualValue(wanted.value);
         connect(bar, &BarGraphItem::focused, this, &GraphArea::barFocused);
         m_bars << bar;
-        ids << spec.fieldId;
+        ids << wanted.fieldId;
         heights << bar->layout().columnHeight;
     }
     const QList<BarLayout::Placement> places =
