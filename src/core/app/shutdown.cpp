@@ -6,16 +6,17 @@
 
 #include "database/mainconnector.h"
 #include "engine/cachefile.h"
+#include "users/loginsession.h"
 #include "web/webpageopener.h"
 
-void shutDown(AppContext &context, const std::function<void()> &logOffCurrentUser)
+void shutDown(AppContext &context)
 {
     const PeriodDataSet::Slot &slot0 = context.periodDataSet().slot(0);
     if (!slot0.isEmpty() && !context.settings().cacheFile.isEmpty())
         CacheFile::write(context.settings().cacheFile, slot0);
 
-    if (context.loginState().loggedIn && logOffCurrentUser)
-        logOffCurrentUser();
+    if (context.loginState().loggedIn && context.mainDatabase().isConnected())
+        LoginSession(context).logoff(false);
 
     context.webPageOpener().closeWindow();
     disconnectMainDatabase(context);

@@ -4,6 +4,7 @@
 #include "app/shutdown.h"
 #include "app/startupsequence.h"
 #include "app/version.h"
+#include "database/configvalues.h"
 #include "engine/cachefile.h"
 #include "sources/accountingsource.h"
 
@@ -149,15 +150,20 @@ void TestStartupShutdown::shutDownWithEmptySlotKeepsOldCache()
 
 void TestStartupShutdown::shutDownLogsOffOnlyALoggedInUser()
 {
-    TestWorkspace workspace;
-    QVERIFY(workspace.configure());
-    QVERIFY(!runStartupSequence(workspace.context()).failed);
-    int logoffs = 0;
-    shutDown(workspace.context(), [&] { ++logoffs; });
-    QCOMPARE(logoffs, 0);
-    workspace.context().loginState().loggedIn = true;
-    shutDown(workspace.context(), [&] { ++logoffs; });
-    QCOMPARE(logoffs, 1);
+    for (const bool loggedIn : {false, true}) {
+        TestWorkspace workspace;
+        QVERIFY(workspace.configure());
+        QVERIFY(!runStartupSequence(workspace.context()).failed);
+        QCOMPARE(ConfigValues(workspace.context().mainDatabase(), workspace.prompter())
+                     .setConfigValue(ConfigValues::UserCount, u"2"_s),
+                 std::nullopt);
+        workspace.context().loginState() = LoginState{loggedIn, u"bob"_s, 0, QString()};
+        shutDown(workspace.context());
+        QVERIFY(runStartupSequence(workspace.context()).message.isEmpty());
+        QCOMPARE(ConfigValues(workspace.context().mainDatabase(), workspace.prompter())
+                     .getConfigValue(ConfigValues::UserCount),
+                 loggedIn ? u"1"_s : u"2"_s);
+    }
 }
 
 void TestStartupShutdown::cacheWrittenAtShutDownIsReadAtNextStart()
