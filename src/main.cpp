@@ -5,7 +5,7 @@
 #include "app/prompter.h"
 #include "app/qtprompter.h"
 #include "app/settingsstore.h"
-#include "app/shutdown.h"
+#include "main/mainwindow.h"
 
 #include <QApplication>
 #include <QStyle>
@@ -26,16 +26,11 @@ int main(int argc, char *argv[])
 
     auto *loading = new LoadingWindow(context, prompter);
     loading->setAttribute(Qt::WA_DeleteOnClose);
+    std::unique_ptr<MainWindow> mainWindow;
     QObject::connect(loading, &LoadingWindow::startupSucceeded, &app, [&] {
-        // The main window is not part of this build yet: say where start-up got to, then end
-        // the run in order.
-        prompter.message(u"Start-up is complete: the database at "_s +
-                             context.settings().mainDatabaseFile +
-                             u" is connected (database version "_s +
-                             context.mainDatabase().databaseVersion() + u")."_s,
-                         u" Veltrix"_s, Prompter::Icon::Information);
-        shutDown(context);
-        QApplication::quit();
+        mainWindow = std::make_unique<MainWindow>(context, prompter);
+        prompter.setParentWindow(mainWindow.get());
+        mainWindow->show();
     });
     loading->show();
     loading->startLoading();

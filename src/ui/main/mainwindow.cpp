@@ -1,0 +1,484 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "mainwindow.h"
+
+#include "app/configdialog.h"
+#include "app/loadingwindow.h"
+#include "views/kpitabview.h"
+
+#include "app/appcontext.h"
+#include "app/errorreporter.h"
+#include "app/prompter.h"
+#include "app/settingsstore.h"
+#include "app/shutdown.h"
+#include "app/version.h"
+#include "database/configvalues.h"
+#include "database/mainconnector.h"
+#include "database/recordoperations.h"
+#include "engine/producecommand.h"
+#include "engine/rangeselection.h"
+#include "users/loginservice.h"
+#include "users/loginsession.h"
+#include "users/usercounter.h"
+#include "views/tabviewbuilder.h"
+#include "web/webpageopener.h"
+
+#include <QCheckBox>
+#include <QCloseEvent>
+#include <QComboBox>
+#include <QCompleter>
+#include <QFocusEvent>
+#include <QFormLayout>
+#include <QGridLayout>
+#include <QHBoxLayout>
+#include <QLabel>
+#include <QLineEdit>
+#include <QMenuBar>
+#include <QPushButton>
+#include <QScreen>
+#include <QStackedWidget>
+#include <QStatusBar>
+#include <QTimer>
+#include <QVBoxLayout>
+
+using namespace Qt::StringLiterals;
+
+MainWindow::MainWindow(AppContext &context, Prompter &prompter, QWidget *parent)
+    : QMainWindow(parent)
+    , m_context(context)
+    , m_prompter(prompter)
+{
+    setObjectName(u"frmMain"_s);
+    setWindowTitle(u"Veltrix"_s);
+    buildMenus();
+
+    m_pages = new QStackedWidget(this);
+    m_pages->addWidget(buildLoginPanel());
+    m_pages->addWidget(buildKpiPanel());
+    setCentralWidget(m_pages);
+
+    m_lblLoggedIn = new QLabel(this);
+    m_lblActiveUsers = new QLabel(this);
+    m_lblDT = new QLabel(this);
+    statusBar()->addWidget(m_lblLoggedIn, 1);
+    statusBar()->addWidget(m_lblActiveUsers, 1);
+    statusBar()->addPermanentWidget(m_lblDT);
+
+    m_tmrUsers = new QTimer(this);
+    m_tmrUsers->setInterval(UserPoll::IntervalMs);
+    connect(m_tmrUsers, &QTimer::timeout, this, &MainWindow::pollUsers);
+    m_tmrDT = new QTimer(this);
+    m_tmrDT->setInterval(1000);
+    connect(m_tmrDT, &QTimer::timeout, this, &MainWindow::updateClock);
+
+    updateLoginState();
+    restoreSelection();
+    loadUserList(true);
+    updateClock();
+    m_tmrUsers->start();
+    m_tmrDT->start();
+    resize(1000, 760);
+}
+
+void MainWindow::buildMenus()
+{
+    QMenu *file = menuBar()->addMenu(u"&File"_s);
+    m_itemLogoff = file->addAction(u"&Logoff"_s, this, [this] { logoff(true); });
+    m_itemPrint = file->addAction(u"&Print"_s);
+    m_itemPrint->setEnabled(false); // the report comes with the printing work
+    file->addSeparator();
+    file->addAction(u"&Exit"_s, this, &QWidget::close);
+
+    QMenu *tools = menuBar()->addMenu(u"&Tools"_s);
+    tools->addAction(u"Check For &Updates"_s, this, [this] {
+        const QString url = WebPageOpener::updatePageUrl(
+            WebPageOpener::webHost(m_context.settingsStore()), AppInfo::appVersion(),
+            m_context.mainDatabase().databaseVersion(), false);
+        const QRect area = screen() ? screen()->availableGeometry() : QRect();
+        if (const auto error =
+                m_context.webPageOpener().openWebPage(url, WebPageOpener::UpdateWindowSize, area))
+            ErrorReporter(m_prompter).reportError(error->number, error->description, u"Update"_s);
+    });
+    tools->addAction(u"&Reset User Counter"_s, this, &MainWindow::resetUserCounter);
+
+    QMenu *setup = menuBar()->addMenu(u"&Setup"_s);
+    m_menuSetup = setup->menuAction();
+    // The setup dialogs arrive with the administration work; until then they stay disabled.
+    setup->addAction(u"&Labour Hours"_s)->setEnabled(false);
+    m_itemSetupMapping = setup->addAction(u"&Account Mapping"_s);
+    m_itemSetupMapping->setEnabled(false);
+    setup->addSeparator();
+    m_itemSetupUsers = setup->addAction(u"&User Accounts"_s);
+    m_itemSetupUsers->setEnabled(false);
+    setup->addAction(u"System &Configuration"_s, this, [this] {
+        if (ConfigDialog::modify(this, m_context.settingsStore(), m_prompter)) {
+            m_prompter.message(u"You must restart the program for the changes to take effect!"_s,
+                               u"Program Restart Required"_s, Prompter::Icon::Information);
+        }
+    });
+
+    QMenu *help = menuBar()->addMenu(u"&Help"_s);
+    help->addAction(u"&About"_s, this,
+                    [this] { LoadingWindow::showAbout(m_context, m_prompter, this); });
+    help->addSeparator();
+    help->addAction(u"&Contents"_s);
+    help->addAction(u"&Book Coaching"_s, this, [this] {
+        const QString url =
+            WebPageOpener::coachingPageUrl(WebPageOpener::webHost(m_context.settingsStore()),
+                                           WebPageOpener::siteName(m_context.settingsStore()));
+        const QRect area = screen() ? screen()->availableGeometry() : QRect();
+        if (const auto error =
+                m_context.webPageOpener().openWebPage(url, WebPageOpener::CoachingWindowSize, area))
+            ErrorReporter(m_prompter).reportError(error->number, error->description, u"Update"_s);
+    });
+}
+
+QWidget *MainWindow::buildLoginPanel()
+{
+    auto *page = new QWidget(this);
+    m_picLogin = new QWidget(page);
+    m_picLogin->setObjectName(u"picLogin"_s);
+    m_lstUsers = new QComboBox(m_picLogin);
+    m_lstUsers->setObjectName(u"lstUsers"_s);
+    m_lstUsers->setEditable(true);
+    m_lstUsers->setInsertPolicy(QComboBox::NoInsert);
+    // Typing completes to the first name that begins so; Backspace does not complete again.
+    m_lstUsers->completer()->setCompletionMode(QCompleter::InlineCompletion);
+    m_lstUsers->completer()->setCaseSensitivity(Qt::CaseInsensitive);
+    m_txtPassword = new QLineEdit(m_picLogin);
+    m_txtPassword->setObjectName(u"txtPassword"_s);
+    m_txtPassword->setEchoMode(QLineEdit::Password);
+    m_txtPassword->installEventFilter(this);
+    auto *butLogin = new QPushButton(u"&Login"_s, m_picLogin);
+    connect(butLogin, &QPushButton::clicked, this,
+            [this] { login(m_lstUsers->currentText(), m_txtPassword->text()); });
+    connect(m_txtPassword, &QLineEdit::returnPressed, this,
+            [this] { login(m_lstUsers->currentText(), m_txtPassword->text()); });
+
+    auto *form = new QFormLayout(m_picLogin);
+    form->addRow(u"Username"_s, m_lstUsers);
+    form->addRow(u"Password"_s, m_txtPassword);
+    form->addRow(QString(), butLogin);
+    m_picLogin->setFixedWidth(320);
+
+    auto *centre = new QGridLayout(page);
+    centre->addWidget(m_picLogin, 0, 0, Qt::AlignCenter);
+    return page;
+}
+
+QWidget *MainWindow::buildKpiPanel()
+{
+    m_kpiPanel = new QWidget(this);
+    const QLocale &locale = m_context.numberFormat().locale();
+    const auto monthList = [&](const QString &name) {
+        auto *list = new QComboBox(m_kpiPanel);
+        list->setObjectName(name);
+        for (int month = 1; month <= 12; ++month)
+            list->addItem(locale.standaloneMonthName(month));
+        return list;
+    };
+    const auto yearBox = [&](const QString &name) {
+        auto *box = new QComboBox(m_kpiPanel);
+        box->setObjectName(name);
+        box->setEditable(true);
+        const int currentYear = m_context.settings().currentYear;
+        for (int year = currentYear; year >= currentYear - 20; --year)
+            box->addItem(QString::number(year));
+        box->installEventFilter(this);
+        return box;
+    };
+    m_lstMonth1 = monthList(u"lstMonth1"_s);
+    m_lstYear1 = yearBox(u"lstYear1"_s);
+    m_lstMonth2 = monthList(u"lstMonth2"_s);
+    m_lstYear2 = yearBox(u"lstYear2"_s);
+
+    const auto stepButton = [&](const QString &text, const QString &tip, auto step) {
+        auto *button = new QPushButton(text, m_kpiPanel);
+        button->setToolTip(tip);
+        button->setFixedWidth(32);
+        connect(button, &QPushButton::clicked, this, step);
+        return button;
+    };
+    auto *butProduce = new QPushButton(u"&Produce KPI"_s, m_kpiPanel);
+    connect(butProduce, &QPushButton::clicked, this, &MainWindow::produce);
+    m_chkCompare = new QCheckBox(u"See The Big Picture"_s, m_kpiPanel);
+    m_chkCompare->setToolTip(u"Lets you compare data from your selected period with past data"_s);
+    m_lstCompareCount = new QComboBox(m_kpiPanel);
+    m_lstCompareCount->addItems({u"1"_s, u"2"_s, u"3"_s, u"4"_s});
+    m_lstCompareType = new QComboBox(m_kpiPanel);
+    m_lstCompareType->addItems({u"Years"_s, u"Periods"_s});
+    m_lstCompareCount->setEnabled(false);
+    m_lstCompareType->setEnabled(false);
+    connect(m_chkCompare, &QCheckBox::toggled, this, [this](bool on) {
+        m_lstCompareCount->setEnabled(on);
+        m_lstCompareType->setEnabled(on);
+    });
+
+    auto *dates = new QHBoxLayout;
+    dates->addWidget(new QLabel(u"From date"_s, m_kpiPanel));
+    dates->addWidget(m_lstMonth1);
+    dates->addWidget(m_lstYear1);
+    dates->addWidget(new QLabel(u"To date"_s, m_kpiPanel));
+    dates->addWidget(m_lstMonth2);
+    dates->addWidget(m_lstYear2);
+    dates->addWidget(stepButton(u"«"_s, u"Previous Year"_s, &MainWindow::stepPreviousYear));
+    dates->addWidget(stepButton(u"‹"_s, u"Previous Month"_s, &MainWindow::stepPreviousMonth));
+    dates->addWidget(stepButton(u"›"_s, u"Following Month"_s, &MainWindow::stepFollowingMonth));
+    dates->addWidget(stepButton(u"»"_s, u"Following Year"_s, &MainWindow::stepFollowingYear));
+    dates->addWidget(butProduce);
+    dates->addStretch();
+    dates->addWidget(m_chkCompare);
+    dates->addWidget(new QLabel(u"The Past"_s, m_kpiPanel));
+    dates->addWidget(m_lstCompareCount);
+    dates->addWidget(m_lstCompareType);
+
+    auto *tabs = new QHBoxLayout;
+    const QStringList captions = TabViewBuilder::tabCaptions();
+    for (int tab = 0; tab < captions.size(); ++tab) {
+        auto *button = new QPushButton(captions[tab], m_kpiPanel);
+        button->setCheckable(true);
+        button->setAutoExclusive(true);
+        connect(button, &QPushButton::clicked, this, [this, tab] { selectTab(tab); });
+        m_butTab << button;
+        tabs->addWidget(button);
+    }
+    tabs->addStretch();
+
+    m_tabView = new KpiTabView(m_context, m_kpiPanel);
+    auto *layout = new QVBoxLayout(m_kpiPanel);
+    layout->addLayout(dates);
+    layout->addLayout(tabs);
+    layout->addWidget(m_tabView, 1);
+    return m_kpiPanel;
+}
+
+void MainWindow::restoreSelection()
+{
+    const std::optional<RangeSelection::Remembered> remembered =
+        RangeSelection::remembered(m_context.settingsStore(), m_context.settings().currentYear);
+    if (!remembered) {
+        ErrorReporter(m_prompter).reportError(380, u"Invalid property value"_s, u"Form Load"_s);
+        return;
+    }
+    m_lstMonth1->setCurrentIndex(remembered->firstMonth - 1);
+    m_lstMonth2->setCurrentIndex(remembered->lastMonth - 1);
+    m_lstYear1->setEditText(remembered->firstYear);
+    m_lstYear2->setEditText(remembered->lastYear);
+}
+
+void MainWindow::loadUserList(bool withMessage)
+{
+    RecordOperations::ListContent names;
+    RecordOperations(m_context.mainDatabase(), m_prompter)
+        .loadList(names, u"Users"_s, u"Username"_s, QString(), false);
+    m_lstUsers->clear();
+    m_lstUsers->addItems(names.items);
+    if (!names.items.isEmpty()) {
+        m_lstUsers->setEditText(m_context.settingsStore().readSetting(u"LastUser"_s));
+        return;
+    }
+    m_lstUsers->setEditText(LoginService::BuiltInUser);
+    if (withMessage) {
+        m_prompter.message(u"There are no users added to the database. Please contact the "
+                           u"Administrator"_s,
+                           u"No Users"_s, Prompter::Icon::Information);
+    }
+}
+
+void MainWindow::updateLoginState()
+{
+    const LoginState &login = m_context.loginState();
+    m_pages->setCurrentIndex(login.loggedIn ? 1 : 0);
+    statusBar()->setVisible(login.loggedIn);
+    m_menuSetup->setEnabled(login.loggedIn && login.currentUserType == 1);
+    m_itemLogoff->setEnabled(login.loggedIn);
+}
+
+void MainWindow::login(const QString &userName, const QString &password)
+{
+    const std::optional<QString> count = LoginSession(m_context).login(userName, password);
+    if (!count) {
+        m_prompter.message(LoginService::LoginFailedMessage, u"Login Failed"_s,
+                           Prompter::Icon::Exclamation);
+        return;
+    }
+    m_lblLoggedIn->setText(u"Welcome, "_s + m_context.loginState().currentUser);
+    m_lblActiveUsers->setText(*count + u" users are logged in"_s);
+    updateLoginState();
+    selectTab(TabViewBuilder::SummaryTab);
+}
+
+void MainWindow::logoff(bool reset)
+{
+    LoginSession(m_context).logoff(reset);
+    if (!reset)
+        return;
+    updateLoginState();
+    m_lstUsers->clearEditText();
+    m_txtPassword->clear();
+    m_lblLoggedIn->clear();
+    m_lblActiveUsers->clear();
+    loadUserList(false);
+    m_lstUsers->setFocus();
+}
+
+void MainWindow::selectTab(int tab)
+{
+    m_currentTab = tab;
+    m_butTab.at(tab)->setChecked(true);
+    m_tabView->showTab(tab);
+}
+
+void MainWindow::showSelection(int firstMonth, int firstYear, int lastMonth, int lastYear)
+{
+    m_lstMonth1->setCurrentIndex(firstMonth - 1);
+    m_lstYear1->setEditText(QString::number(firstYear));
+    m_lstMonth2->setCurrentIndex(lastMonth - 1);
+    m_lstYear2->setEditText(QString::number(lastYear));
+}
+
+void MainWindow::produce()
+{
+    const ProduceCommand::Selection selection{
+        m_lstMonth1->currentIndex() + 1, m_lstYear1->currentText().toInt(),
+        m_lstMonth2->currentIndex() + 1, m_lstYear2->currentText().toInt()};
+    if (ProduceCommand(m_context).produce(selection) != ProduceCommand::Outcome::Produced)
+        return;
+    selectTab(m_currentTab);
+}
+
+namespace {
+
+ProduceCommand::Selection selectionOf(const QComboBox *month1, const QComboBox *year1,
+                                      const QComboBox *month2, const QComboBox *year2)
+{
+    return {month1->currentIndex() + 1, year1->currentText().toInt(), month2->currentIndex() + 1,
+            year2->currentText().toInt()};
+}
+
+} // namespace
+
+void MainWindow::step(
+    const std::function<std::optional<ProduceCommand::Selection>(const ProduceCommand::Selection &)>
+        &next)
+{
+    const std::optional<ProduceCommand::Selection> stepped =
+        next(selectionOf(m_lstMonth1, m_lstYear1, m_lstMonth2, m_lstYear2));
+    if (!stepped) {
+        m_prompter.message(RangeSelection::LimitMessage, RangeSelection::LimitTitle,
+                           Prompter::Icon::Exclamation);
+        return;
+    }
+    showSelection(stepped->firstMonth, stepped->firstYear, stepped->lastMonth, stepped->lastYear);
+    produce();
+}
+
+void MainWindow::stepPreviousMonth()
+{
+    step(RangeSelection::previousMonth);
+}
+
+void MainWindow::stepFollowingMonth()
+{
+    const int currentYear = m_context.settings().currentYear;
+    step([currentYear](const auto &selection) {
+        return RangeSelection::followingMonth(selection, currentYear);
+    });
+}
+
+void MainWindow::stepPreviousYear()
+{
+    step(RangeSelection::previousYear);
+}
+
+void MainWindow::stepFollowingYear()
+{
+    const int currentYear = m_context.settings().currentYear;
+    step([currentYear](const auto &selection) {
+        return RangeSelection::followingYear(selection, currentYear);
+    });
+}
+
+void MainWindow::pollUsers()
+{
+    if (!m_context.mainDatabase().isConnected())
+        return;
+    const UserPoll::Result result = m_poll.tick(ConfigValues(m_context.mainDatabase(), m_prompter));
+    m_lblActiveUsers->setText(result.activeUsers + u" users are logged in"_s);
+    switch (result.action) {
+    case UserPoll::Action::Logoff:
+        logoff(true);
+        m_prompter.message(u"You have been logged off due to a network request that requires "
+                           u"all users to logoff!"_s,
+                           u"Network Request"_s, Prompter::Icon::Information);
+        break;
+    case UserPoll::Action::Shutdown:
+        close();
+        break;
+    case UserPoll::Action::Disconnect:
+        logoff(true);
+        m_picLogin->hide();
+        disconnectMainDatabase(m_context);
+        m_prompter.message(u"You have been disconnected due to a network request that requires "
+                           u"all users to disconnect from the database!"_s,
+                           u"Network Request"_s, Prompter::Icon::Information);
+        break;
+    case UserPoll::Action::None:
+        break;
+    }
+}
+
+void MainWindow::resetUserCounter()
+{
+    const Prompter::Answer answer = m_prompter.message(
+        u"Warning: This will disconnect and logoff all active users!\r\n\r\nOnly reset the user "
+        u"counter if the displayed # of logged on users is incorrect\r\nAre you sure you want to "
+        u"Reset the User Counter?"_s,
+        u"Reset User Counter"_s, Prompter::Icon::Exclamation, Prompter::Buttons::YesNo);
+    if (answer != Prompter::Answer::Yes)
+        return;
+    if (const auto error = UserCounter(m_context.mainDatabase()).reset())
+        ErrorReporter(m_prompter).reportError(error->number, error->description, u"Update"_s);
+}
+
+QString MainWindow::clockText(const QDateTime &moment)
+{
+    return QLocale(QLocale::English, QLocale::Australia)
+        .toString(moment, u"dddd, d MMM yyyy h:mm AP"_s);
+}
+
+void MainWindow::updateClock()
+{
+    const QString text = clockText(m_context.clock().now());
+    if (m_lblDT->text() != text)
+        m_lblDT->setText(text);
+}
+
+bool MainWindow::eventFilter(QObject *watched, QEvent *event)
+{
+    if (watched == m_txtPassword && event->type() == QEvent::FocusIn) {
+        // Keyboard focus selects the password for retyping; a click places the caret.
+        if (static_cast<QFocusEvent *>(event)->reason() != Qt::MouseFocusReason)
+            QTimer::singleShot(0, m_txtPassword, &QLineEdit::selectAll);
+    }
+    if (event->type() == QEvent::FocusOut && (watched == m_lstYear1 || watched == m_lstYear2)) {
+        auto *box = static_cast<QComboBox *>(watched);
+        const int currentYear = m_context.settings().currentYear;
+        if (!RangeSelection::isValidYear(box->currentText(), currentYear)) {
+            m_prompter.message(RangeSelection::invalidYearMessage(currentYear),
+                               RangeSelection::InvalidYearTitle, Prompter::Icon::Exclamation);
+            QTimer::singleShot(0, box, [box] { box->setFocus(); });
+        }
+    }
+    return QMainWindow::eventFilter(watched, event);
+}
+
+void MainWindow::closeEvent(QCloseEvent *event)
+{
+    if (!m_shutDown) {
+        m_shutDown = true;
+        m_tmrUsers->stop();
+        m_tmrDT->stop();
+        shutDown(m_context);
+    }
+    event->accept();
+}

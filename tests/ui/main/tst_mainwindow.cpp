@@ -1,0 +1,224 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "testworkspace.h"
+
+#include "app/demoworkspace.h"
+#include "app/settingsloader.h"
+#include "database/configvalues.h"
+#include "database/mainconnector.h"
+#include "main/mainwindow.h"
+#include "views/gridmodel.h"
+#include "views/kpitabview.h"
+
+#include <QComboBox>
+#include <QLabel>
+#include <QLineEdit>
+#include <QSqlQuery>
+#include <QTest>
+
+using namespace Qt::StringLiterals;
+
+class TestMainWindow : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void init();
+    void cleanup();
+    void loginInAnyCaseGreetsTheStoredName();
+    void builtInAccountWithNoUsers();
+    void failedLogin();
+    void stepButtons_data();
+    void stepButtons();
+    void invalidYear();
+    void resetCounterLogsEveryWindowOff();
+    void clockFormat();
+    void produceShowsTheDemoFigures();
+
+private:
+    std::unique_ptr<MainWindow> openWindow(TestWorkspace &workspace)
+    {
+        if (!loadSettings(workspace.context()).isEmpty() ||
+            !connectMainDatabase(workspace.context()).isEmpty())
+            return nullptr;
+        workspace.prompter().clearMessages();
+        auto window = std::make_unique<MainWindow>(workspace.context(), workspace.prompter());
+        return window;
+    }
+    void addUser(TestWorkspace &workspace, const QString &name)
+    {
+        QSqlQuery query(workspace.context().mainDatabase().database());
+        query.prepare(
+            u"INSERT INTO Users (UserName, Password, Type, Fields) VALUES (?, 'pw', 0, '1')"_s);
+        query.addBindValue(name);
+        QVERIFY(query.exec());
+    }
+
+    std::unique_ptr<TestWorkspace> m_workspace;
+};
+
+void TestMainWindow::init()
+{
+    m_workspace = std::make_unique<TestWorkspace>();
+    QVERIFY(m_workspace->configure());
+}
+
+void TestMainWindow::cleanup()
+{
+    m_workspace.reset();
+}
+
+void TestMainWindow::loginInAnyCaseGreetsTheStoredName()
+{
+    auto window = openWindow(*m_workspace);
+    QVERIFY(window);
+    addUser(*m_workspace, u"bob"_s);
+    window->login(u"Bob"_s, u"pw"_s);
+    QCOMPARE(window->lblLoggedIn()->text(), u"Welcome, bob"_s);
+    QCOMPARE(window->lblActiveUsers()->text(), u"1 users are logged in"_s);
+    QVERIFY(!window->menuSetup()->isEnabled());
+    window->logoff(true);
+    QCOMPARE(ConfigValues(m_workspace->context().mainDatabase(), m_workspace->prompter())
+                 .getConfigValue(4),
+             u"0"_s);
+    QVERIFY(!window->itemLogoff()->isEnabled());
+}
+
+void TestMainWindow::builtInAccountWithNoUsers()
+{
+    auto window = openWindow(*m_workspace);
+    QVERIFY(window);
+    QCOMPARE(window->lstUsers()->currentText(), u"sysop"_s);
+    QCOMPARE(m_workspace->prompter().messages().size(), 1);
+    QCOMPARE(m_workspace->prompter().messages().first().title, u"No Users"_s);
+    window->login(u"sysop"_s, u"sysop"_s);
+    QVERIFY(window->menuSetup()->isEnabled());
+    QCOMPARE(window->lblActiveUsers()->text(), u"0 users are logged in"_s);
+}
+
+void TestMainWindow::failedLogin()
+{
+    auto window = openWindow(*m_workspace);
+    QVERIFY(window);
+    addUser(*m_workspace, u"ann_1"_s);
+    addUser(*m_workspace, u"annA1"_s);
+    m_workspace->prompter().clearMessages();
+    window->login(u"ann_1"_s, u"pw"_s); // matches two users
+    QCOMPARE(m_workspace->prompter().messages().size(), 1);
+    QCOMPARE(m_workspace->prompter().messages().first().title, u"Login Failed"_s);
+    QCOMPARE(m_workspace->prompter().messages().first().text,
+             u"Login failed! Ensure your username and password are correct!"_s);
+    QVERIFY(!m_workspace->context().loginState().loggedIn);
+}
+
+void TestMainWindow::stepButtons_data()
+{
+    QTest::addColumn<QString>("button");
+    QTest::addColumn<QStringList>("from"); // month index, year, month index, year
+    QTest::addColumn<QStringList>("to");   // empty: "Limit Reached"
+    QTest::newRow("previous month")
+        << u"previous month"_s << QStringList{u"2"_s, u"2005"_s, u"5"_s, u"2005"_s}
+        << QStringList{u"1"_s, u"2005"_s, u"1"_s, u"2005"_s};
+    QTest::newRow("previous month from January 1950")
+        << u"previous month"_s << QStringList{u"0"_s, u"1950"_s, u"0"_s, u"1950"_s}
+        << QStringList();
+    QTest::newRow("previous year")
+        << u"previous year"_s << QStringList{u"6"_s, u"2004"_s, u"5"_s, u"2005"_s}
+        << QStringList{u"6"_s, u"2003"_s, u"5"_s, u"2004"_s};
+}
+
+void TestMainWindow::stepButtons()
+{
+    QFETCH(QString, button);
+    QFETCH(QStringList, from);
+    QFETCH(QStringList, to);
+    auto window = openWindow(*m_workspace);
+    QVERIFY(window);
+    window->lstMonth1()->setCurrentIndex(from[0].toInt());
+    window->lstYear1()->setEditText(from[1]);
+    window->lstMonth2()->setCurrentIndex(from[2].toInt());
+    window->lstYear2()->setEditText(from[3]);
+    m_workspace->prompter().clearMessages();
+    if (button == u"previous month"_s)
+        window->stepPreviousMonth();
+    else
+        window->stepPreviousYear();
+    if (to.isEmpty()) {
+        QCOMPARE(m_workspace->prompter().messages().first().title, u"Limit Reached"_s);
+        QCOMPARE(window->lstYear1()->currentText(), from[1]);
+        return;
+    }
+    QCOMPARE(QString::number(window->lstMonth1()->currentIndex()), to[0]);
+    QCOMPARE(window->lstYear1()->currentText(), to[1]);
+    QCOMPARE(QString::number(window->lstMonth2()->currentIndex()), to[2]);
+    QCOMPARE(window->lstYear2()->currentText(), to[3]);
+}
+
+void TestMainWindow::invalidYear()
+{
+    auto window = openWindow(*m_workspace);
+    QVERIFY(window);
+    window->show();
+    QVERIFY(QTest::qWaitForWindowExposed(window.get()));
+    window->login(u"sysop"_s, u"sysop"_s);
+    m_workspace->prompter().clearMessages();
+    window->lstYear1()->setFocus();
+    QTRY_VERIFY(window->lstYear1()->hasFocus());
+    window->lstYear1()->setEditText(u"1949"_s);
+    window->lstMonth1()->setFocus();
+    QTRY_COMPARE(m_workspace->prompter().messages().size(), 1);
+    const RecordingPrompter::Message &message = m_workspace->prompter().messages().first();
+    QCOMPARE(message.title, u"Invalid Year"_s);
+    QVERIFY(message.text.endsWith(QString::number(m_workspace->context().settings().currentYear)));
+}
+
+void TestMainWindow::resetCounterLogsEveryWindowOff()
+{
+    auto window = openWindow(*m_workspace);
+    QVERIFY(window);
+    addUser(*m_workspace, u"bob"_s);
+    window->login(u"bob"_s, u"pw"_s);
+    m_workspace->prompter().scriptAnswer(Prompter::Answer::Yes);
+    window->resetUserCounter();
+    m_workspace->prompter().clearMessages();
+    window->pollUsers();
+    QVERIFY(!m_workspace->context().loginState().loggedIn);
+    QCOMPARE(m_workspace->prompter().messages().size(), 1);
+    QCOMPARE(m_workspace->prompter().messages().first().title, u"Network Request"_s);
+    window->pollUsers(); // the second look withdraws the request
+    const ConfigValues config(m_workspace->context().mainDatabase(), m_workspace->prompter());
+    QCOMPARE(config.getConfigValue(5), QString());
+    QCOMPARE(config.getConfigValue(4), u"0"_s);
+}
+
+void TestMainWindow::clockFormat()
+{
+    QCOMPARE(MainWindow::clockText(QDateTime(QDate(2026, 12, 5), QTime(9, 5))),
+             u"Saturday, 5 Dec 2026 9:05 AM"_s);
+    QCOMPARE(MainWindow::clockText(QDateTime(QDate(2026, 12, 5), QTime(21, 30))),
+             u"Saturday, 5 Dec 2026 9:30 PM"_s);
+}
+
+void TestMainWindow::produceShowsTheDemoFigures()
+{
+    QTemporaryDir dir;
+    QCOMPARE(DemoWorkspace::create(dir.filePath(u"demo"_s), QStringLiteral(VELTRIX_NEW_DB)),
+             std::nullopt);
+    DemoWorkspace::configure(m_workspace->store(), dir.filePath(u"demo"_s));
+    auto window = openWindow(*m_workspace);
+    QVERIFY(window);
+    window->login(u"manager"_s, u"manager1"_s);
+    window->lstMonth1()->setCurrentIndex(6);
+    window->lstYear1()->setEditText(u"2025"_s);
+    window->lstMonth2()->setCurrentIndex(5);
+    window->lstYear2()->setEditText(u"2026"_s);
+    window->produce();
+    GridModel &grid = window->tabView()->grid();
+    QVERIFY(grid.rowCount() > 5);
+    QCOMPARE(grid.cellText(2, grid.columnIndex(u"label"_s)), u"Panel labour gross profit %"_s);
+    // The same text veltrix-cli produce prints for this line and range.
+    QCOMPARE(grid.cellText(2, grid.columnIndex(u"value"_s)), u"48.2%"_s);
+    QCOMPARE(m_workspace->store().readSetting(u"M1"_s), u"6"_s);
+}
+
+QTEST_MAIN(TestMainWindow)
+#include "tst_mainwindow.moc"
