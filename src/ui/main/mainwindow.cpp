@@ -19,6 +19,7 @@
 #include "users/loginservice.h"
 #include "users/loginsession.h"
 #include "users/usercounter.h"
+#include "views/kpigrid.h"
 #include "views/tabviewbuilder.h"
 #include "web/webpageopener.h"
 
@@ -30,6 +31,7 @@
 #include <QFormLayout>
 #include <QGridLayout>
 #include <QHBoxLayout>
+#include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
 #include <QMenuBar>
@@ -141,9 +143,23 @@ QWidget *MainWindow::buildLoginPanel()
     m_lstUsers->setObjectName(u"lstUsers"_s);
     m_lstUsers->setEditable(true);
     m_lstUsers->setInsertPolicy(QComboBox::NoInsert);
-    // Typing completes to the first name that begins so; Backspace does not complete again.
-    m_lstUsers->completer()->setCompletionMode(QCompleter::InlineCompletion);
-    m_lstUsers->completer()->setCaseSensitivity(Qt::CaseInsensitive);
+    // Typing completes to the first name that begins so, with the completed part selected so
+    // that typing on replaces it; deleting (Backspace, Delete) never completes again.
+    m_lstUsers->setCompleter(nullptr);
+    m_lstUsers->lineEdit()->installEventFilter(this);
+    connect(m_lstUsers->lineEdit(), &QLineEdit::textEdited, this, [this](const QString &typed) {
+        if (m_deletingUserName || typed.isEmpty())
+            return;
+        for (int i = 0; i < m_lstUsers->count(); ++i) {
+            const QString name = m_lstUsers->itemText(i);
+            if (!name.isEmpty() && name.startsWith(typed, Qt::CaseInsensitive)) {
+                QLineEdit *box = m_lstUsers->lineEdit();
+                box->setText(name);
+                box->setSelection(int(typed.size()), int(name.size() - typed.size()));
+                return;
+            }
+        }
+    });
     m_txtPassword = new QLineEdit(m_picLogin);
     m_txtPassword->setObjectName(u"txtPassword"_s);
     m_txtPassword->setEchoMode(QLineEdit::Password);
@@ -242,6 +258,26 @@ QWidget *MainWindow::buildKpiPanel()
         tabs->addWidget(button);
     }
     tabs->addStretch();
+
+    // The colour legend: what the cells' colours say.
+    auto *legend = new QWidget(m_kpiPanel);
+    legend->setObjectName(u"picCoding"_s);
+    auto *legendRow = new QHBoxLayout(legend);
+    legendRow->setContentsMargins(0, 0, 0, 0);
+    legendRow->addWidget(new QLabel(u"<b>Colour Coding</b>"_s, legend));
+    const std::pair<QString, QColor> entries[] = {{u"Poor %"_s, KpiGrid::Red},
+                                                  {u"Income $"_s, KpiGrid::AccountAbove},
+                                                  {u"Expense $"_s, KpiGrid::AccountBelow},
+                                                  {u"Percentage %"_s, KpiGrid::Percentage},
+                                                  {u"Good %"_s, KpiGrid::Green},
+                                                  {u"Average %"_s, KpiGrid::Yellow}};
+    for (const auto &[caption, colour] : entries) {
+        auto *entry = new QLabel(caption, legend);
+        entry->setStyleSheet(
+            u"background: %1; padding: 2px 6px; border: 1px solid #B0B0B0;"_s.arg(colour.name()));
+        legendRow->addWidget(entry);
+    }
+    tabs->addWidget(legend);
 
     m_tabView = new KpiTabView(m_context, m_kpiPanel);
     auto *layout = new QVBoxLayout(m_kpiPanel);
@@ -455,6 +491,10 @@ void MainWindow::updateClock()
 
 bool MainWindow::eventFilter(QObject *watched, QEvent *event)
 {
+    if (watched == m_lstUsers->lineEdit() && event->type() == QEvent::KeyPress) {
+        const int key = static_cast<QKeyEvent *>(event)->key();
+        m_deletingUserName = key == Qt::Key_Backspace || key == Qt::Key_Delete;
+    }
     if (watched == m_txtPassword && event->type() == QEvent::FocusIn) {
         // Keyboard focus selects the password for retyping; a click places the caret.
         if (static_cast<QFocusEvent *>(event)->reason() != Qt::MouseFocusReason)

@@ -82,6 +82,7 @@ private:
     Prompter &m_prompter;
     UserPoll m_poll;
     int m_currentTab = 0;
+    bool m_deletingUserName = false;
 
     QStackedWidget *m_pages = nullptr;
     QWidget *m_picLogin = nullptr;

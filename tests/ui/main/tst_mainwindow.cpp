@@ -32,13 +32,21 @@ private Q_SLOTS:
     void invalidYear();
     void resetCounterLogsEveryWindowOff();
     void clockFormat();
+    void typeAheadCompletesNames();
+    void twoWindowsCountToTwoAndBack();
+    void shutdownRequestClosesTheWindow();
     void produceShowsTheDemoFigures();
 
 private:
+    static bool connectWorkspace(TestWorkspace &workspace)
+    {
+        return workspace.context().mainDatabase().isConnected() ||
+               (loadSettings(workspace.context()).isEmpty() &&
+                connectMainDatabase(workspace.context()).isEmpty());
+    }
     std::unique_ptr<MainWindow> openWindow(TestWorkspace &workspace)
     {
-        if (!loadSettings(workspace.context()).isEmpty() ||
-            !connectMainDatabase(workspace.context()).isEmpty())
+        if (!connectWorkspace(workspace))
             return nullptr;
         workspace.prompter().clearMessages();
         auto window = std::make_unique<MainWindow>(workspace.context(), workspace.prompter());
@@ -196,6 +204,63 @@ void TestMainWindow::clockFormat()
              u"Saturday, 5 Dec 2026 9:05 AM"_s);
     QCOMPARE(MainWindow::clockText(QDateTime(QDate(2026, 12, 5), QTime(21, 30))),
              u"Saturday, 5 Dec 2026 9:30 PM"_s);
+}
+
+void TestMainWindow::typeAheadCompletesNames()
+{
+    QVERIFY(connectWorkspace(*m_workspace));
+    addUser(*m_workspace, u"Anna"_s);
+    addUser(*m_workspace, u"John"_s);
+    auto window = openWindow(*m_workspace);
+    QVERIFY(window);
+    window->show();
+    QVERIFY(QTest::qWaitForWindowExposed(window.get()));
+    QLineEdit *box = window->lstUsers()->lineEdit();
+    box->clear();
+    box->setFocus();
+    QTest::keyClick(box, Qt::Key_J);
+    QCOMPARE(box->text(), u"John"_s);
+    QCOMPARE(box->selectedText(), u"ohn"_s);
+    QTest::keyClick(box, Qt::Key_Backspace);
+    QCOMPARE(box->text(), u"J"_s);
+}
+
+void TestMainWindow::twoWindowsCountToTwoAndBack()
+{
+    QVERIFY(connectWorkspace(*m_workspace));
+    addUser(*m_workspace, u"bob"_s);
+    addUser(*m_workspace, u"carol"_s);
+    TestWorkspace other;
+    other.store().writeSetting(u"DBPath"_s, m_workspace->sharedFolder());
+    other.store().writeSetting(u"AccPackage"_s, u"MoneyWorks"_s);
+    auto first = openWindow(*m_workspace);
+    auto second = openWindow(other);
+    QVERIFY(first && second);
+    first->login(u"bob"_s, u"pw"_s);
+    second->login(u"carol"_s, u"pw"_s);
+    QCOMPARE(second->lblActiveUsers()->text(), u"2 users are logged in"_s);
+    first->pollUsers();
+    QCOMPARE(first->lblActiveUsers()->text(), u"2 users are logged in"_s);
+    first->logoff(true);
+    second->logoff(true);
+    QCOMPARE(ConfigValues(m_workspace->context().mainDatabase(), m_workspace->prompter())
+                 .getConfigValue(4),
+             u"0"_s);
+}
+
+void TestMainWindow::shutdownRequestClosesTheWindow()
+{
+    auto window = openWindow(*m_workspace);
+    QVERIFY(window);
+    window->show();
+    QVERIFY(QTest::qWaitForWindowExposed(window.get()));
+    QCOMPARE(ConfigValues(m_workspace->context().mainDatabase(), m_workspace->prompter())
+                 .setConfigValue(5, u"Shutdown"_s),
+             std::nullopt);
+    window->pollUsers();
+    QVERIFY(!window->isVisible());
+    // Shut down in order: the database is closed.
+    QVERIFY(!m_workspace->context().mainDatabase().isConnected());
 }
 
 void TestMainWindow::produceShowsTheDemoFigures()
