@@ -17,7 +17,6 @@ int main(int argc, char *argv[])
     QApplication app(argc, argv);
     QApplication::setOrganizationName(u"Veltrix"_s);
     QApplication::setApplicationName(u"veltrix"_s);
-    QApplication::setApplicationDisplayName(u"Veltrix"_s);
 
     QtPrompter prompter;
     AppContext context(std::make_unique<SettingsStore>(), prompter, AppLocations::forThisMachine());
