@@ -2,21 +2,19 @@
 #include "loadingwindow.h"
 
 #include "configdialog.h"
+#include "webpages.h"
 
 #include "app/appcontext.h"
-#include "app/errorreporter.h"
 #include "app/prompter.h"
 #include "app/startupsequence.h"
 #include "app/version.h"
 #include "database/mainconnector.h"
-#include "web/webpageopener.h"
 
 #include <QApplication>
 #include <QEvent>
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QPushButton>
-#include <QScreen>
 #include <QTimer>
 #include <QVBoxLayout>
 
@@ -168,15 +166,7 @@ void LoadingWindow::openOptions()
 
 void LoadingWindow::openUpdatePage()
 {
-    const QString url = WebPageOpener::updatePageUrl(
-        WebPageOpener::webHost(m_context.settingsStore()), AppInfo::appVersion(),
-        m_context.mainDatabase().databaseVersion(), true);
-    const QScreen *currentScreen = screen();
-    const QRect area = currentScreen ? currentScreen->availableGeometry() : QRect();
-    if (const auto error =
-            m_context.webPageOpener().openWebPage(url, WebPageOpener::UpdateWindowSize, area)) {
-        ErrorReporter(m_prompter).reportError(error->number, error->description, u"Update"_s);
-    }
+    WebPages::openUpdatePage(m_context, m_prompter, *this, true);
 }
 
 bool LoadingWindow::eventFilter(QObject *watched, QEvent *event)

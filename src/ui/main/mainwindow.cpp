@@ -3,6 +3,7 @@
 
 #include "app/configdialog.h"
 #include "app/loadingwindow.h"
+#include "app/webpages.h"
 #include "views/kpitabview.h"
 
 #include "app/appcontext.h"
@@ -10,7 +11,6 @@
 #include "app/prompter.h"
 #include "app/settingsstore.h"
 #include "app/shutdown.h"
-#include "app/version.h"
 #include "database/configvalues.h"
 #include "database/mainconnector.h"
 #include "database/recordoperations.h"
@@ -21,7 +21,6 @@
 #include "users/usercounter.h"
 #include "views/kpigrid.h"
 #include "views/tabviewbuilder.h"
-#include "web/webpageopener.h"
 
 #include <QCheckBox>
 #include <QCloseEvent>
@@ -36,7 +35,6 @@
 #include <QLineEdit>
 #include <QMenuBar>
 #include <QPushButton>
-#include <QScreen>
 #include <QStackedWidget>
 #include <QStatusBar>
 #include <QTimer>
@@ -91,15 +89,8 @@ void MainWindow::buildMenus()
     file->addAction(u"&Exit"_s, this, &QWidget::close);
 
     QMenu *tools = menuBar()->addMenu(u"&Tools"_s);
-    tools->addAction(u"Check For &Updates"_s, this, [this] {
-        const QString url = WebPageOpener::updatePageUrl(
-            WebPageOpener::webHost(m_context.settingsStore()), AppInfo::appVersion(),
-            m_context.mainDatabase().databaseVersion(), false);
-        const QRect area = screen() ? screen()->availableGeometry() : QRect();
-        if (const auto error =
-                m_context.webPageOpener().openWebPage(url, WebPageOpener::UpdateWindowSize, area))
-            ErrorReporter(m_prompter).reportError(error->number, error->description, u"Update"_s);
-    });
+    tools->addAction(u"Check For &Updates"_s, this,
+                     [this] { WebPages::openUpdatePage(m_context, m_prompter, *this, false); });
     tools->addAction(u"&Reset User Counter"_s, this, &MainWindow::resetUserCounter);
 
     QMenu *setup = menuBar()->addMenu(u"&Setup"_s);
@@ -123,15 +114,8 @@ void MainWindow::buildMenus()
                     [this] { LoadingWindow::showAbout(m_context, m_prompter, this); });
     help->addSeparator();
     help->addAction(u"&Contents"_s);
-    help->addAction(u"&Book Coaching"_s, this, [this] {
-        const QString url =
-            WebPageOpener::coachingPageUrl(WebPageOpener::webHost(m_context.settingsStore()),
-                                           WebPageOpener::siteName(m_context.settingsStore()));
-        const QRect area = screen() ? screen()->availableGeometry() : QRect();
-        if (const auto error =
-                m_context.webPageOpener().openWebPage(url, WebPageOpener::CoachingWindowSize, area))
-            ErrorReporter(m_prompter).reportError(error->number, error->description, u"Update"_s);
-    });
+    help->addAction(u"&Book Coaching"_s, this,
+                    [this] { WebPages::openCoachingPage(m_context, m_prompter, *this); });
 }
 
 QWidget *MainWindow::buildLoginPanel()
