@@ -78,6 +78,8 @@ int writeCacheForever(const QStringList &arguments)
         second.fieldValues << u"-2222.2"_s;
         second.fieldAbs << u"2222.2"_s;
     }
+    // One whole cache is in place before the writer can be killed in the middle of the next.
+    CacheFile::write(arguments[0], first);
     QTextStream(stdout) << "writing" << Qt::endl;
     for (;;) {
         CacheFile::write(arguments[0], first);
