@@ -79,6 +79,11 @@ public:
 
     const Font &font() const { return m_font; }
     void setFont(const Font &font) { m_font = font; }
+    // The colours of cells that have none of their own.
+    QColor foreground() const { return m_foreground; }
+    void setForeground(const QColor &colour) { m_foreground = colour; }
+    QColor background() const { return m_background; }
+    void setBackground(const QColor &colour) { m_background = colour; }
 
     // Drawing switch: off suspends the announcements until it is on again.
     void setRedraw(bool on);
@@ -103,6 +108,8 @@ private:
     QList<Column> m_columns;
     QList<Row> m_rows;
     Font m_font{QStringLiteral("Sans Serif"), 9.0, false};
+    QColor m_foreground = QColor(0, 0, 0);
+    QColor m_background = QColor(0xFF, 0xFF, 0xFF);
     int m_selectedRow = 0;
     bool m_redraw = true;
     bool m_pendingChange = false;

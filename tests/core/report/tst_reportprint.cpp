@@ -1,0 +1,279 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "app/settingsstore.h"
+#include "report/pagesetup.h"
+#include "report/reportrenderer.h"
+
+#include <QImage>
+#include <QPdfWriter>
+#include <QProcess>
+#include <QStandardPaths>
+#include <QTemporaryDir>
+#include <QTest>
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+QString tool(const QString &name)
+{
+    return QStandardPaths::findExecutable(name);
+}
+
+QString pdfText(const QString &pdf)
+{
+    QProcess process;
+    process.start(tool(u"pdftotext"_s), {u"-layout"_s, pdf, u"-"_s});
+    process.waitForFinished(60000);
+    return QString::fromUtf8(process.readAllStandardOutput());
+}
+
+QImage pdfPage(const QString &pdf, int page, const QString &folder)
+{
+    QProcess process;
+    const QString prefix = folder + u"/page"_s;
+    process.start(tool(u"pdftoppm"_s),
+                  {u"-png"_s, u"-r"_s, u"50"_s, u"-f"_s, QString::number(page), u"-l"_s,
+                   QString::number(page), u"-singlefile"_s, pdf, prefix});
+    process.waitForFinished(60000);
+    return QImage(prefix + u".png"_s);
+}
+
+bool hasColour(const QImage &image, QRgb colour, int tolerance = 6)
+{
+    for (int y = 0; y < image.height(); ++y) {
+        for (int x = 0; x < image.width(); ++x) {
+            const QRgb p = image.pixel(x, y);
+            if (std::abs(qRed(p) - qRed(colour)) <= tolerance &&
+                std::abs(qGreen(p) - qGreen(colour)) <= tolerance &&
+                std::abs(qBlue(p) - qBlue(colour)) <= tolerance)
+                return true;
+        }
+    }
+    return false;
+}
+
+QString tablePage(int rows, const QString &picture = {})
+{
+    QString html = u"<html>\r\n<body bgcolor='#ffffff'>\r\n<table width='100%' cellpadding='4' "
+                   u"cellspacing='0'>\r\n"_s;
+    for (int r = 1; r <= rows; ++r) {
+        html += u"<tr>\r\n<td style='background-color:#A2E11B;font-size:12;'>Line %1</td>"
+                u"<td align='right'>%2</td>\r\n</tr>\r\n"_s.arg(r)
+                    .arg(r * 100);
+    }
+    html += u"</table>\r\n"_s;
+    if (!picture.isEmpty())
+        html += u"<p align='left'><img src='"_s + picture + u"'></p>"_s;
+    return html + u"</body></html>"_s;
+}
+
+} // namespace
+
+class TestReportPrint : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void initTestCase();
+    void sessionReplacesAndRestores_data();
+    void sessionReplacesAndRestores();
+    void pageOptions_data();
+    void pageOptions();
+    void expandCodes_data();
+    void expandCodes();
+    void unitlessFontSizesBecomePixels();
+    void printsHeaderFooterAndPages();
+    void backgroundsFollowTheOption();
+    void pictureIsPrintedAndWidePagesShrink();
+
+private:
+    QTemporaryDir m_folder;
+};
+
+void TestReportPrint::initTestCase()
+{
+    if (tool(u"pdftotext"_s).isEmpty() || tool(u"pdftoppm"_s).isEmpty())
+        QFAIL("pdftotext and pdftoppm (poppler-utils) are needed; scripts/install-deps installs "
+              "them");
+}
+
+void TestReportPrint::sessionReplacesAndRestores_data()
+{
+    QTest::addColumn<bool>("hadValues");
+    QTest::addColumn<bool>("printed");
+    QTest::newRow("user values, printed") << true << true;
+    QTest::newRow("user values, never printed") << true << false;
+    QTest::newRow("no values, printed") << false << true;
+}
+
+void TestReportPrint::sessionReplacesAndRestores()
+{
+    QFETCH(bool, hadValues);
+    QFETCH(bool, printed);
+    QTemporaryDir folder;
+    SettingsStore store(folder.filePath(u"settings.ini"_s));
+    const QString key = PageSetupSession::Key;
+    if (hadValues) {
+        store.writeSetting(u"margin_top"_s, u"0.75"_s, key);
+        store.writeSetting(u"margin_left"_s, u"0.3"_s, key);
+        store.writeSetting(u"header"_s, u"&w&bPage &p of &P"_s, key);
+        store.writeSetting(u"Print_Background"_s, u"yes"_s, key);
+    }
+    QStringList before;
+    for (const QString &name : PageSetupSession::valueNames())
+        before << store.readSetting(name, key);
+    {
+        PageSetupSession session(store);
+        QCOMPARE(store.readSetting(u"margin_top"_s, key), u"0.5"_s);
+        QCOMPARE(store.readSetting(u"margin_left"_s, key), u"0.4"_s);
+        QCOMPARE(store.readSetting(u"margin_right"_s, key), u"0.4"_s);
+        QCOMPARE(store.readSetting(u"Shrink_To_Fit"_s, key), u"yes"_s);
+        if (printed)
+            session.applyPageOptions(false, true, true, u"1/07/2025 to 30/06/2026"_s);
+        const PrintOptions options = PrintOptions::fromStore(store);
+        QCOMPARE(options.marginTopInches, 0.5);
+        QCOMPARE(options.marginLeftInches, 0.4);
+        QVERIFY(options.shrinkToFit);
+    }
+    QStringList after;
+    for (const QString &name : PageSetupSession::valueNames())
+        after << store.readSetting(name, key);
+    QCOMPARE(after, before);
+    QVERIFY(store.readSetting(u"header"_s, key, u"absent"_s) != u"absent"_s || !hadValues);
+}
+
+void TestReportPrint::pageOptions_data()
+{
+    QTest::addColumn<bool>("formatting");
+    QTest::addColumn<bool>("date");
+    QTest::addColumn<bool>("pages");
+    QTest::addColumn<QString>("background");
+    QTest::addColumn<QString>("header");
+    QTest::addColumn<QString>("footer");
+    QTest::newRow("all on") << true << true << true << u"yes"_s << u"Title&b&d"_s
+                            << u"&bPage &p of &P"_s;
+    QTest::newRow("all off") << false << false << false << u"no"_s << u"Title"_s << QString();
+    QTest::newRow("date only") << false << true << false << u"no"_s << u"Title&b&d"_s << QString();
+}
+
+void TestReportPrint::pageOptions()
+{
+    QFETCH(bool, formatting);
+    QFETCH(bool, date);
+    QFETCH(bool, pages);
+    QFETCH(QString, background);
+    QFETCH(QString, header);
+    QFETCH(QString, footer);
+    QTemporaryDir folder;
+    SettingsStore store(folder.filePath(u"settings.ini"_s));
+    PageSetupSession session(store);
+    session.applyPageOptions(formatting, date, pages, u"Title"_s);
+    const QString key = PageSetupSession::Key;
+    QCOMPARE(store.readSetting(u"Print_Background"_s, key), background);
+    QCOMPARE(store.readSetting(u"header"_s, key), header);
+    QCOMPARE(store.readSetting(u"footer"_s, key), footer);
+    const PrintOptions options = PrintOptions::fromStore(store);
+    QCOMPARE(options.printBackground, formatting);
+    QCOMPARE(options.header, header);
+}
+
+void TestReportPrint::expandCodes_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QStringList>("parts");
+    QTest::newRow("title and date")
+        << u"Jul to Jun&b&d"_s << QStringList{u"Jul to Jun"_s, QString(), u"6/12/26"_s};
+    QTest::newRow("page numbers") << u"&bPage &p of &P"_s
+                                  << QStringList{QString(), QString(), u"Page 2 of 3"_s};
+    QTest::newRow("three parts") << u"a&bb&bc"_s << QStringList{u"a"_s, u"b"_s, u"c"_s};
+    QTest::newRow("ampersands") << u"R&&D &x&"_s << QStringList{u"R&D &x&"_s, QString(), {}};
+    QTest::newRow("empty") << QString() << QStringList{QString(), QString(), QString()};
+    QTest::newRow("window title") << u"&w"_s << QStringList{u"Page Preview"_s, {}, {}};
+}
+
+void TestReportPrint::expandCodes()
+{
+    QFETCH(QString, text);
+    QFETCH(QStringList, parts);
+    const ReportRenderer::Margins margins = ReportRenderer::expandCodes(
+        text, 2, 3, QDate(2026, 12, 6), QLocale(QLocale::English, QLocale::Australia),
+        u"Page Preview"_s);
+    QCOMPARE((QStringList{margins.left, margins.centre, margins.right}), parts);
+}
+
+void TestReportPrint::unitlessFontSizesBecomePixels()
+{
+    QCOMPARE(ReportRenderer::printableHtml(u"<td style='font-size:10.25;font-weight:bold;'>"_s),
+             u"<td style='font-size:10.25px;font-weight:bold;'>"_s);
+    QCOMPARE(ReportRenderer::printableHtml(u"font-size:12pt;"_s), u"font-size:12pt;"_s);
+}
+
+void TestReportPrint::printsHeaderFooterAndPages()
+{
+    const QString pdf = m_folder.filePath(u"pages.pdf"_s);
+    PrintOptions options;
+    options.marginTopInches = 0.5;
+    options.marginLeftInches = options.marginRightInches = 0.4;
+    options.header = u"1/07/2025 to 30/06/2026&b&d"_s;
+    options.footer = u"&bPage &p of &P"_s;
+    options.locale = QLocale(QLocale::English, QLocale::Australia);
+    int pages = 0;
+    {
+        QPdfWriter writer(pdf);
+        writer.setPageSize(QPageSize(QPageSize::A4));
+        pages = ReportRenderer(tablePage(150), m_folder.path())
+                    .print(writer, options, QDate(2026, 12, 6));
+    }
+    QVERIFY(pages >= 2);
+    const QString text = pdfText(pdf);
+    QVERIFY(text.contains(u"1/07/2025 to 30/06/2026"_s));
+    QVERIFY(text.contains(u"6/12/26"_s));
+    QVERIFY(text.contains(u"Page 1 of %1"_s.arg(pages)));
+    QVERIFY(text.contains(u"Page %1 of %1"_s.arg(pages)));
+    QVERIFY(text.contains(u"Line 1 "_s));
+    QVERIFY(text.contains(u"Line 150"_s));
+    QCOMPARE(text.count(u'\f'), pages);
+}
+
+void TestReportPrint::backgroundsFollowTheOption()
+{
+    for (const bool background : {true, false}) {
+        const QString pdf = m_folder.filePath(u"background.pdf"_s);
+        PrintOptions options;
+        options.printBackground = background;
+        {
+            QPdfWriter writer(pdf);
+            QVERIFY(ReportRenderer(tablePage(5), m_folder.path()).print(writer, options) == 1);
+        }
+        const QImage page = pdfPage(pdf, 1, m_folder.path());
+        QVERIFY(!page.isNull());
+        QCOMPARE(hasColour(page, qRgb(0xA2, 0xE1, 0x1B)), background);
+        QVERIFY(pdfText(pdf).contains(u"Line 5"_s));
+    }
+}
+
+void TestReportPrint::pictureIsPrintedAndWidePagesShrink()
+{
+    // A picture three pages wide: the page is shrunk so that all of it shows.
+    QImage picture(2400, 200, QImage::Format_RGB32);
+    picture.fill(qRgb(0, 0, 255));
+    for (int x = 2200; x < 2400; ++x) {
+        for (int y = 0; y < 200; ++y)
+            picture.setPixel(x, y, qRgb(255, 0, 0));
+    }
+    const QString bmp = m_folder.filePath(u"tmp.bmp"_s);
+    QVERIFY(picture.save(bmp, "BMP"));
+    const QString pdf = m_folder.filePath(u"picture.pdf"_s);
+    PrintOptions options;
+    options.printBackground = true;
+    {
+        QPdfWriter writer(pdf);
+        QVERIFY(ReportRenderer(tablePage(3, bmp), m_folder.path()).print(writer, options) >= 1);
+    }
+    const QImage page = pdfPage(pdf, 1, m_folder.path());
+    QVERIFY(hasColour(page, qRgb(0, 0, 255), 30));
+    QVERIFY(hasColour(page, qRgb(255, 0, 0), 30)); // the right-hand end made it onto the page
+}
+
+QTEST_MAIN(TestReportPrint)
+#include "tst_reportprint.moc"
