@@ -5,11 +5,14 @@
 #include "demoverb.h"
 #include "passwordverbs.h"
 #include "produceverb.h"
+#include "reportverb.h"
 
+#include <QApplication>
 #include <QCoreApplication>
 #include <QTextStream>
 
 #include <functional>
+#include <memory>
 
 using namespace Qt::StringLiterals;
 
@@ -38,6 +41,12 @@ const QList<Verb> &verbs()
          u"--from YYYY-MM --to YYYY-MM --user NAME --password PW [--settings FILE] "
          u"[--compare years|periods --count N] [--format csv|json]"_s,
          u"produce a range and print its figures"_s, ProduceVerb::produce},
+        {u"report"_s,
+         u"--from YYYY-MM --to YYYY-MM --user NAME --password PW [--settings FILE] [--tab N] "
+         u"[--compare years|periods --count N] --out FILE.html|FILE.pdf"_s,
+         u"write the printed report of a tab as HTML or PDF"_s, ReportVerb::report},
+        {u"encode-gif"_s, u"IN OUT.gif [--transparent RRGGBB]"_s,
+         u"write any picture as an 8-bit GIF with the fixed palette"_s, GifVerb::encodeGif},
         {u"create-database"_s, u"SCRIPT OUTPUT"_s, u"make a database file from a SQL script"_s,
          DatabaseVerbs::createDatabase},
     };
@@ -57,7 +66,16 @@ int usage(QTextStream &out)
 
 int main(int argc, char *argv[])
 {
-    QCoreApplication app(argc, argv);
+    // The report draws the program's own graph and grid off screen; it never needs a display,
+    // so a scheduled job can run it.
+    const bool drawsWidgets = argc > 1 && qstrcmp(argv[1], "report") == 0;
+    std::unique_ptr<QCoreApplication> app;
+    if (drawsWidgets) {
+        qputenv("QT_QPA_PLATFORM", "offscreen");
+        app = std::make_unique<QApplication>(argc, argv);
+    } else {
+        app = std::make_unique<QCoreApplication>(argc, argv);
+    }
     QCoreApplication::setOrganizationName(u"Veltrix"_s);
     QCoreApplication::setApplicationName(u"veltrix"_s);
 

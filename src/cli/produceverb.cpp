@@ -1,15 +1,10 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "produceverb.h"
 
+#include "headlesssession.h"
+
 #include "app/appcontext.h"
-#include "app/consoleprompter.h"
-#include "app/settingsstore.h"
-#include "app/startupsequence.h"
-#include "database/mainconnector.h"
-#include "engine/producecommand.h"
-#include "engine/rangeloader.h"
 #include "users/loginservice.h"
-#include "views/comparisonranges.h"
 #include "views/gridmodel.h"
 #include "views/kpievaluation.h"
 #include "views/tabviewbuilder.h"
@@ -38,12 +33,6 @@ int usageError(const QString &problem)
         << "       [--settings FILE] [--compare years|periods --count N] [--format csv|json]"
         << Qt::endl;
     return 2;
-}
-
-std::optional<QDate> month(const QString &text)
-{
-    const QDate date = QDate::fromString(text + u"-01"_s, u"yyyy-MM-dd"_s);
-    return date.isValid() ? std::optional<QDate>(date) : std::nullopt;
 }
 
 QString numberText(double value)
@@ -135,77 +124,29 @@ void print(const QList<Record> &records, bool json)
 int produce(const QStringList &arguments)
 {
     QCommandLineParser parser;
-    parser.addOptions({{u"from"_s, u"first month"_s, u"YYYY-MM"_s},
-                       {u"to"_s, u"last month"_s, u"YYYY-MM"_s},
-                       {u"user"_s, u"user name"_s, u"NAME"_s},
-                       {u"password"_s, u"password"_s, u"PW"_s},
-                       {u"settings"_s, u"settings file"_s, u"FILE"_s},
-                       {u"compare"_s, u"years or periods"_s, u"KIND"_s},
-                       {u"count"_s, u"earlier periods, 1 to 4"_s, u"N"_s},
-                       {u"format"_s, u"csv or json"_s, u"FORMAT"_s, u"csv"_s}});
+    HeadlessSession::addOptions(parser);
+    parser.addOption({u"format"_s, u"csv or json"_s, u"FORMAT"_s, u"csv"_s});
     if (!parser.parse(QStringList{u"veltrix-cli produce"_s} + arguments))
         return usageError(parser.errorText());
-
-    const auto from = month(parser.value(u"from"_s));
-    const auto to = month(parser.value(u"to"_s));
-    if (!from || !to)
-        return usageError(u"--from and --to need a month written YYYY-MM"_s);
-    if (!parser.isSet(u"user"_s))
-        return usageError(u"--user is needed"_s);
+    const auto read = HeadlessSession::readOptions(parser);
+    if (const QString *problem = std::get_if<QString>(&read))
+        return usageError(*problem);
+    const auto &options = std::get<HeadlessSession::Options>(read);
     const QString format = parser.value(u"format"_s);
     if (format != u"csv"_s && format != u"json"_s)
         return usageError(u"--format is csv or json"_s);
-    std::optional<ComparisonRanges::Kind> compareKind;
-    int compareCount = 0;
-    if (parser.isSet(u"compare"_s)) {
-        compareKind = ComparisonRanges::kindFromText(parser.value(u"compare"_s));
-        bool ok = false;
-        compareCount = parser.value(u"count"_s).toInt(&ok);
-        if (!compareKind || !ok || compareCount < 1 || compareCount > 4)
-            return usageError(u"--compare is years or periods, with --count 1 to 4"_s);
-    }
 
-    ConsolePrompter prompter;
-    auto store = parser.isSet(u"settings"_s)
-                     ? std::make_unique<SettingsStore>(parser.value(u"settings"_s))
-                     : std::make_unique<SettingsStore>();
-    AppContext context(std::move(store), prompter, AppLocations::forThisMachine());
-
-    const StartupOutcome startup = runStartupSequence(context);
-    if (startup.failed) {
-        QTextStream(stderr) << startup.message << Qt::endl;
-        return 2;
-    }
-    const auto login = LoginService::checkCredentials(
-        context.mainDatabase(), parser.value(u"user"_s), parser.value(u"password"_s));
-    if (!login) {
-        QTextStream(stderr) << LoginService::LoginFailedMessage << Qt::endl;
-        disconnectMainDatabase(context);
-        return 2;
-    }
-    context.loginState() = *login;
-
-    const ProduceCommand::Selection selection{from->month(), from->year(), to->month(), to->year()};
-    if (ProduceCommand(context).produce(selection) != ProduceCommand::Outcome::Produced) {
-        disconnectMainDatabase(context);
-        return 2;
-    }
-
+    HeadlessSession::Session session;
+    if (const int failed = session.open(options))
+        return failed;
+    AppContext &context = session.context();
     QList<Record> records = recordsOfSlot(context, 0);
-    if (compareKind) {
-        PeriodDataSet &data = context.periodDataSet();
-        const auto ranges =
-            ComparisonRanges::earlierRanges(data.range(0), *compareKind, compareCount);
-        for (int slot = 1; slot <= ranges.size(); ++slot) {
-            data.setRange(slot, ranges[slot - 1]);
-            data.setCurrentSlot(quint8(slot));
-            RangeLoader(context).loadDateRange(ranges[slot - 1].start, ranges[slot - 1].end);
+    if (options.compareKind) {
+        session.loadComparison(options);
+        for (int slot = 1; slot <= options.compareCount; ++slot)
             records += recordsOfSlot(context, slot);
-        }
-        data.setCurrentSlot(0);
     }
     print(records, format == u"json"_s);
-    disconnectMainDatabase(context);
     return 0;
 }
 

@@ -35,6 +35,14 @@ double RangeLoader::hourlyRate(int recordId)
     return rate.isNull() ? 0.0 : m_context.numberFormat().toNumber(rate);
 }
 
+void RangeLoader::loadSlot(int slot, const QDate &start, const QDate &end)
+{
+    PeriodDataSet &data = m_context.periodDataSet();
+    data.setRange(slot, {start, end});
+    data.setCurrentSlot(quint8(slot));
+    loadDateRange(start, end);
+}
+
 void RangeLoader::loadDateRange(const QDate &start, const QDate &end)
 {
     const BusyPointer busy(m_context.prompter());

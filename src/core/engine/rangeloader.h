@@ -15,6 +15,8 @@ public:
     explicit RangeLoader(AppContext &context);
 
     void loadDateRange(const QDate &start, const QDate &end);
+    // Records the range as the slot's, makes the slot current and loads it.
+    void loadSlot(int slot, const QDate &start, const QDate &end);
 
     // Days from start to end whose weekday is Monday to Friday, both ends included.
     static int workingDays(const QDate &start, const QDate &end);

@@ -68,4 +68,25 @@ QList<Placement> placeBars(const QList<qint64> &fieldIds, const QList<int> &heig
     return placements;
 }
 
+CompareLayout layoutCompareBars(const QList<qint64> &fieldIds, int periods, int firstLeft,
+                                int innerWidthTwips)
+{
+    CompareLayout layout;
+    const int bars = int(fieldIds.size());
+    if (bars == 0 || periods < 1)
+        return layout;
+    const int groups = bars / periods;
+    // A window too narrow for its bars still shows each of them one twip wide.
+    layout.barWidth = std::max(1, (innerWidthTwips - Gap * groups - 20) / bars);
+    for (int n = 0; n < bars; ++n) {
+        if (n == 0) {
+            layout.lefts << firstLeft;
+            continue;
+        }
+        const bool newField = fieldIds[n] != fieldIds[n - 1];
+        layout.lefts << layout.lefts.last() + layout.barWidth + (newField ? Gap : 0);
+    }
+    return layout;
+}
+
 } // namespace BarLayout

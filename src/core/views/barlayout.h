@@ -44,4 +44,14 @@ int barWidthTwips(double twipsPerPixelX);
 QList<Placement> placeBars(const QList<qint64> &fieldIds, const QList<int> &heightsPixels,
                            double twipsPerPixelX, double twipsPerPixelY, bool compare);
 
+// A comparison graph stretched over the width it has: every bar as wide as the others, the
+// bars of one Field touching, a gap between Fields. The first bar keeps its place.
+struct CompareLayout
+{
+    int barWidth = 0;
+    QList<int> lefts;
+};
+CompareLayout layoutCompareBars(const QList<qint64> &fieldIds, int periods, int firstLeft,
+                                int innerWidthTwips);
+
 } // namespace BarLayout

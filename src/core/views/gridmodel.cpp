@@ -91,6 +91,24 @@ void GridModel::setRedraw(bool on)
     }
 }
 
+void GridModel::setColumnVisible(int index, bool visible)
+{
+    column(index).visible = visible;
+    changed();
+}
+
+void GridModel::setColumnHeader(int index, const QString &header)
+{
+    column(index).header = header;
+    changed();
+}
+
+void GridModel::setColumnWidth(int index, int width)
+{
+    column(index).width = width;
+    changed();
+}
+
 void GridModel::changed()
 {
     if (m_redraw)

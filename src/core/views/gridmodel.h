@@ -57,6 +57,10 @@ public:
     int columnCount() const { return int(m_columns.size()); }
     const Column &column(int index) const { return m_columns.at(index - 1); }
     Column &column(int index) { return m_columns[index - 1]; }
+    // Column changes that the views show at once.
+    void setColumnVisible(int index, bool visible);
+    void setColumnHeader(int index, const QString &header);
+    void setColumnWidth(int index, int width);
     // 0 when no column has the key.
     int columnIndex(const QString &key) const;
 

@@ -7,6 +7,7 @@
 #include "app/appcontext.h"
 #include "app/prompter.h"
 #include "database/recordoperations.h"
+#include "engine/perioddataset.h"
 #include "users/loginservice.h"
 
 using namespace Qt::StringLiterals;
@@ -38,6 +39,23 @@ void TabViewBuilder::addMainColumns(GridModel &grid)
     grid.addColumn(u"value"_s, u"Value"_s, GridModel::AlignCentre, 100, true);
     grid.addColumn(u"benchmark"_s, u"Optimal %"_s, GridModel::AlignCentre, 80, true);
     grid.addColumn(u"variant"_s, u"Variant"_s, GridModel::AlignCentre, 80, true);
+    setupGrid(grid);
+}
+
+void TabViewBuilder::addCompareColumns(GridModel &grid)
+{
+    grid.addColumn(u"id"_s, QString(), GridModel::AlignLeft, 0, true);
+    grid.addColumn(u"type"_s, QString(), GridModel::AlignLeft, 80, false);
+    grid.addColumn(u"data"_s, QString(), GridModel::AlignLeft, 80, false);
+    grid.addColumn(u"row"_s, u"Row"_s, GridModel::AlignLeft, 45, true);
+    grid.addColumn(u"label"_s, u"Field"_s, GridModel::AlignLeft, 250, true);
+    for (int slot = PeriodDataSet::SlotCount - 1; slot >= 1; --slot) {
+        grid.addColumn(u"value"_s + QString::number(slot), u"Value "_s + QString::number(slot + 1),
+                       GridModel::AlignCentre, 110, false);
+    }
+    grid.addColumn(u"value"_s, u"Value"_s, GridModel::AlignCentre, 110, true);
+    grid.addColumn(u"benchmark"_s, u"Optimal %"_s, GridModel::AlignCentre, 0, false);
+    grid.addColumn(u"average"_s, u"Average"_s, GridModel::AlignRight, 100, true);
     setupGrid(grid);
 }
 
@@ -74,11 +92,10 @@ void TabViewBuilder::buildTabView(int tab, int pastCount)
     applyUsersLines();
 }
 
-QList<TabViewBuilder::GraphBar> TabViewBuilder::graphBars(const GridModel &grid)
+QList<TabViewBuilder::GraphBar> TabViewBuilder::graphBars(const GridModel &grid, int pastCount)
 {
     QList<GraphBar> bars;
     PeriodDataSet &data = m_context.periodDataSet();
-    data.setCurrentSlot(0);
     MainDatabase &database = m_context.mainDatabase();
     const RecordOperations records(database, m_context.prompter());
     const int benchmarkColumn = grid.columnIndex(u"benchmark"_s);
@@ -86,12 +103,16 @@ QList<TabViewBuilder::GraphBar> TabViewBuilder::graphBars(const GridModel &grid)
         if (grid.cellText(row, benchmarkColumn).isEmpty())
             continue;
         const qint64 id = grid.cellText(row, 1).toLongLong();
-        const int pos = data.current().findFieldPos(id);
-        if (pos == 0 || !records.findRecordById(database.fieldsRecordset(), id))
-            continue;
-        bars << GraphBar{id, database.fieldsRecordset().value(u"Data"_s).toString(),
-                         data.getFieldAbs(id)};
+        for (int slot = pastCount; slot >= 0; --slot) {
+            data.setCurrentSlot(quint8(slot));
+            const int pos = data.current().findFieldPos(id);
+            if (pos == 0 || !records.findRecordById(database.fieldsRecordset(), id))
+                continue;
+            bars << GraphBar{id, database.fieldsRecordset().value(u"Data"_s).toString(),
+                             data.getFieldAbs(id)};
+        }
     }
+    data.setCurrentSlot(0);
     return bars;
 }
 

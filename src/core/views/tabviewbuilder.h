@@ -20,6 +20,8 @@ public:
     static QStringList tabCaptions();
     // The columns of the main window's KPI grid.
     static void addMainColumns(GridModel &grid);
+    // The columns of the comparison grid: the earlier periods' columns start hidden.
+    static void addCompareColumns(GridModel &grid);
 
     // One bar of the graph: a percentage Field with data in the current slot.
     struct GraphBar
@@ -29,8 +31,9 @@ public:
         double value = 0.0;
     };
 
-    // The bars of the main window's graph, from the grid's rows with a benchmark, in order.
-    QList<GraphBar> graphBars(const GridModel &grid);
+    // The bars of the graph, from the grid's rows with a benchmark, in order; with earlier
+    // periods each Field has one bar per period with data, the oldest first.
+    QList<GraphBar> graphBars(const GridModel &grid, int pastCount = 0);
 
     // pastCount is 0 in the main window, 1 to 4 in the comparison window.
     void buildTabView(int tab, int pastCount);

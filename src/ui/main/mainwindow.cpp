@@ -4,6 +4,9 @@
 #include "app/configdialog.h"
 #include "app/loadingwindow.h"
 #include "app/webpages.h"
+#include "report/gridreport.h"
+#include "views/comparewindow.h"
+#include "views/grapharea.h"
 #include "views/kpitabview.h"
 
 #include "app/appcontext.h"
@@ -83,8 +86,7 @@ void MainWindow::buildMenus()
 {
     QMenu *file = menuBar()->addMenu(u"&File"_s);
     m_itemLogoff = file->addAction(u"&Logoff"_s, this, [this] { logoff(true); });
-    m_itemPrint = file->addAction(u"&Print"_s);
-    m_itemPrint->setEnabled(false); // the report comes with the printing work
+    m_itemPrint = file->addAction(u"&Print"_s, this, &MainWindow::print);
     file->addSeparator();
     file->addAction(u"&Exit"_s, this, &QWidget::close);
 
@@ -364,6 +366,18 @@ void MainWindow::produce()
     if (ProduceCommand(m_context).produce(selection) != ProduceCommand::Outcome::Produced)
         return;
     selectTab(m_currentTab);
+    if (m_chkCompare->isChecked()) {
+        CompareWindow::compareData(m_context, this, m_lstCompareType->currentText(),
+                                   m_lstCompareCount->currentText().toInt());
+    }
+}
+
+void MainWindow::print()
+{
+    QWidget *graph = nullptr;
+    if (m_currentTab == TabViewBuilder::SummaryTab)
+        graph = m_tabView->picGraph();
+    GridReport::printGrid(m_context, this, m_tabView->grid(), graph);
 }
 
 namespace {

@@ -33,6 +33,7 @@ public:
     void login(const QString &userName, const QString &password);
     void logoff(bool reset);
     void produce();
+    void print();
     void stepPreviousMonth();
     void stepFollowingMonth();
     void stepPreviousYear();
@@ -58,6 +59,7 @@ public:
     QLabel *lblActiveUsers() const { return m_lblActiveUsers; }
     QLabel *lblDT() const { return m_lblDT; }
     QAction *itemLogoff() const { return m_itemLogoff; }
+    QAction *itemPrint() const { return m_itemPrint; }
     QAction *menuSetup() const { return m_menuSetup; }
 
     static QString clockText(const QDateTime &moment);

@@ -42,8 +42,10 @@ QSize GraphArea::sizeHint() const
     return {ScaleMargin + toPixelsX(ScaleWidth), toPixelsY(ScaleLines[0]) + 20};
 }
 
-void GraphArea::setBars(const QList<BarSpec> &specs, bool compare)
+void GraphArea::setBars(const QList<BarSpec> &specs, bool compare, int periods)
 {
+    m_compare = compare;
+    m_periods = std::max(1, periods);
     qDeleteAll(m_bars);
     qDeleteAll(m_labels);
     m_bars.clear();
@@ -78,12 +80,45 @@ void GraphArea::setBars(const QList<BarSpec> &specs, bool compare)
         label->show();
         m_labels << label;
     }
+    if (compare)
+        layoutCompareBars();
+}
+
+void GraphArea::layoutCompareBars()
+{
+    QList<qint64> ids;
+    for (const BarGraphItem *bar : std::as_const(m_bars))
+        ids << bar->tag();
+    const double tpp = BarGraphItem::twipsPerPixelX(this);
+    const int innerTwips = int(std::lround((width() - ScaleMargin) * tpp));
+    const BarLayout::CompareLayout layout =
+        BarLayout::layoutCompareBars(ids, m_periods, BarLayout::FirstLeft, innerTwips);
+    for (int n = 0; n < m_bars.size(); ++n) {
+        BarGraphItem *bar = m_bars[n];
+        bar->setAutoWidth(false);
+        const int left = ScaleMargin + toPixelsX(layout.lefts[n]);
+        const int right = ScaleMargin + toPixelsX(layout.lefts[n] + layout.barWidth);
+        bar->setGeometry(left, bar->y(), std::max(1, right - left), bar->height());
+    }
+}
+
+void GraphArea::resizeEvent(QResizeEvent *event)
+{
+    QWidget::resizeEvent(event);
+    if (m_compare)
+        layoutCompareBars();
+}
+
+int GraphArea::scaleRight() const
+{
+    // A comparison stretches its scale over the whole width; the main graph keeps its own.
+    return m_compare ? width() : ScaleMargin + toPixelsX(ScaleWidth);
 }
 
 void GraphArea::paintEvent(QPaintEvent *)
 {
     QPainter painter(this);
-    const int right = ScaleMargin + toPixelsX(ScaleWidth);
+    const int right = scaleRight();
     for (int i = 0; i < 11; ++i) {
         painter.setPen(i == 0 ? QColor(0x80, 0x80, 0x80) : QColor(0xE0, 0xE0, 0xE0));
         const int y = toPixelsY(ScaleLines[i]);

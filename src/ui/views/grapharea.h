@@ -24,8 +24,9 @@ public:
 
     explicit GraphArea(const NumberFormat &numbers, QWidget *parent = nullptr);
 
-    // Replaces the bars. In a comparison the bars of one Field touch and carry no labels.
-    void setBars(const QList<BarSpec> &bars, bool compare);
+    // Replaces the bars. In a comparison of periods (the produced one and the earlier ones)
+    // the bars of one Field touch, carry no labels and share the graph's width.
+    void setBars(const QList<BarSpec> &bars, bool compare, int periods = 1);
     const QList<BarGraphItem *> &bars() const { return m_bars; }
     const QList<QLabel *> &variantLabels() const { return m_labels; }
 
@@ -39,12 +40,18 @@ Q_SIGNALS:
 
 protected:
     void paintEvent(QPaintEvent *event) override;
+    void resizeEvent(QResizeEvent *event) override;
 
 private:
+    void layoutCompareBars();
+    int scaleRight() const;
+
     int toPixelsX(int twips) const;
     int toPixelsY(int twips) const;
 
     const NumberFormat &m_numbers;
     QList<BarGraphItem *> m_bars;
     QList<QLabel *> m_labels;
+    bool m_compare = false;
+    int m_periods = 1;
 };

@@ -8,6 +8,7 @@
 #include "app/appcontext.h"
 #include "database/recordoperations.h"
 #include "views/gridoperations.h"
+#include "views/kpigrid.h"
 #include "views/tabviewbuilder.h"
 
 #include <QLabel>
@@ -15,9 +16,10 @@
 
 using namespace Qt::StringLiterals;
 
-KpiTabView::KpiTabView(AppContext &context, QWidget *parent)
+KpiTabView::KpiTabView(AppContext &context, QWidget *parent, int pastCount)
     : QWidget(parent)
     , m_context(context)
+    , m_pastCount(pastCount)
     , m_caption(new QLabel(this))
     , m_graph(new GraphArea(context.numberFormat(), this))
     , m_gridView(new GridView(m_grid, this))
@@ -30,7 +32,10 @@ KpiTabView::KpiTabView(AppContext &context, QWidget *parent)
     m_caption->setFont(captionFont);
     m_graph->setObjectName(u"picGraph"_s);
     m_gridView->setObjectName(u"lstGrid"_s);
-    TabViewBuilder::addMainColumns(m_grid);
+    if (m_pastCount > 0)
+        TabViewBuilder::addCompareColumns(m_grid);
+    else
+        TabViewBuilder::addMainColumns(m_grid);
 
     auto *layout = new QVBoxLayout(this);
     layout->addWidget(m_caption);
@@ -44,19 +49,31 @@ KpiTabView::KpiTabView(AppContext &context, QWidget *parent)
     });
 }
 
+KpiTabView::~KpiTabView()
+{
+    // The grid view shows m_grid: it must go before the grid does, not with the other
+    // children after it, or closing the window would draw from a grid that is gone.
+    delete m_gridView;
+}
+
 void KpiTabView::showTab(int tab)
 {
     m_tab = tab;
     m_caption->setText(TabViewBuilder::tabCaptions().value(tab).remove(u'&'));
     m_gridView->hide();
     TabViewBuilder builder(m_context, m_grid);
-    builder.buildTabView(tab, 0);
+    builder.buildTabView(tab, m_pastCount);
+    if (m_pastCount > 0) {
+        KpiGrid(m_grid, m_context.periodDataSet(), m_context.mainDatabase(), m_context.prompter(),
+                m_context.numberFormat())
+            .computeAverages(m_pastCount);
+    }
     m_gridView->show();
     if (tab == TabViewBuilder::SummaryTab) {
         QList<GraphArea::BarSpec> bars;
-        for (const TabViewBuilder::GraphBar &bar : builder.graphBars(m_grid))
+        for (const TabViewBuilder::GraphBar &bar : builder.graphBars(m_grid, m_pastCount))
             bars << GraphArea::BarSpec{bar.fieldId, bar.benchmark, bar.value};
-        m_graph->setBars(bars, false);
+        m_graph->setBars(bars, m_pastCount > 0, m_pastCount + 1);
     }
     m_graph->setVisible(tab == TabViewBuilder::SummaryTab);
 }

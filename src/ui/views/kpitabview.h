@@ -11,18 +11,22 @@ class GridView;
 class QLabel;
 class TooltipPanel;
 
-// What the main window shows of one KPI tab: the caption, the bar graph (Summary tab only),
-// the grid, and the explanation panel of a picked Field. Picking a bar selects its row.
+// What a KPI window shows of one tab: the caption, the bar graph (Summary tab only), the grid,
+// and the explanation panel of a picked Field. Picking a bar selects its row. With earlier
+// periods (the comparison window) the grid has a column per period and an average, and the
+// graph a bar per Field and period.
 class KpiTabView : public QWidget
 {
     Q_OBJECT
 
 public:
-    explicit KpiTabView(AppContext &context, QWidget *parent = nullptr);
+    explicit KpiTabView(AppContext &context, QWidget *parent = nullptr, int pastCount = 0);
+    ~KpiTabView() override;
 
     // Rebuilds the grid for the tab, and the graph on the Summary tab.
     void showTab(int tab);
     int currentTab() const { return m_tab; }
+    int pastCount() const { return m_pastCount; }
 
     GridModel &grid() { return m_grid; }
     GridView *lstGrid() const { return m_gridView; }
@@ -37,6 +41,7 @@ private:
     void selectField(qint64 fieldId);
 
     AppContext &m_context;
+    const int m_pastCount;
     GridModel m_grid;
     int m_tab = 1;
     QLabel *m_caption;

@@ -1,0 +1,75 @@
+// Veltrix — KPI dashboard for small businesses.
+#pragma once
+
+#include "engine/perioddataset.h"
+#include "views/comparisonranges.h"
+
+#include <QDialog>
+
+class AppContext;
+class KpiTabView;
+class QLabel;
+class QPushButton;
+class QTimer;
+
+// frmCompare: the produced range beside the same range in up to four earlier years or earlier
+// periods of equal length. It loads the earlier ranges into slots 1 to N while a progress bar
+// moves period by period, then shows the tabs with a column per period, the averages, and on
+// the Summary tab a bar per Field and period.
+class CompareWindow : public QDialog
+{
+    Q_OBJECT
+
+public:
+    CompareWindow(AppContext &context, ComparisonRanges::Kind kind, int count,
+                  QWidget *owner = nullptr);
+    ~CompareWindow() override;
+
+    // Opens the window modally over the owner; returns when it is closed.
+    static void compareData(AppContext &context, QWidget *owner, const QString &kind, int count);
+
+    // "Jul 03 - Jun 04".
+    static QString rangeHeader(const PeriodDataSet::Range &range, const QLocale &locale);
+
+    void selectTab(int tab);
+    void print();
+    bool isLoading() const { return m_loading; }
+
+    KpiTabView *tabView() const { return m_tabView; }
+    QWidget *picLoad() const { return m_picLoad; }
+    QLabel *lblLoad() const { return m_lblLoad; }
+    QWidget *shpProgress() const { return m_shpProgress; }
+    QPushButton *tabButton(int tab) const { return m_butTab.at(tab); }
+
+    static constexpr int MinimumHeightTwips = 7875;
+
+Q_SIGNALS:
+    // Every earlier period is loaded and the first tab shows.
+    void loaded();
+
+public Q_SLOTS:
+    void done(int result) override;
+
+protected:
+    void resizeEvent(QResizeEvent *event) override;
+
+private:
+    void loadPeriods();
+    void layoutLoadingPanel();
+    void fitLabelColumn();
+
+    AppContext &m_context;
+    const ComparisonRanges::Kind m_kind;
+    const int m_count;
+    int m_currentTab = 0;
+    bool m_loading = true;
+    bool m_unloaded = false;
+
+    QTimer *m_tmrStart;
+    KpiTabView *m_tabView;
+    QList<QPushButton *> m_butTab;
+    QWidget *m_picLoad;
+    QLabel *m_lblLoad;
+    QWidget *m_picProgress;
+    QWidget *m_shpProgress;
+};
