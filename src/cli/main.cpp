@@ -62,6 +62,15 @@ int usage(QTextStream &out)
     return 2;
 }
 
+// The off-screen platform remarks on every window it is asked to show; a scheduled report
+// should print only what concerns its user.
+void quietOffscreenRemarks(QtMsgType type, const QMessageLogContext &context, const QString &text)
+{
+    if (type == QtWarningMsg && text.startsWith(u"This plugin does not support"_s))
+        return;
+    QTextStream(stderr) << qFormatLogMessage(type, context, text) << Qt::endl;
+}
+
 } // namespace
 
 int main(int argc, char *argv[])
@@ -72,6 +81,7 @@ int main(int argc, char *argv[])
     std::unique_ptr<QCoreApplication> app;
     if (drawsWidgets) {
         qputenv("QT_QPA_PLATFORM", "offscreen");
+        qInstallMessageHandler(quietOffscreenRemarks);
         app = std::make_unique<QApplication>(argc, argv);
     } else {
         app = std::make_unique<QCoreApplication>(argc, argv);

@@ -6,11 +6,13 @@
 #include "sources/companyfile.h"
 
 #include <QCryptographicHash>
+#include <QImage>
 #include <QJsonArray>
 #include <QJsonDocument>
 #include <QJsonObject>
 #include <QProcess>
 #include <QSqlQuery>
+#include <QStandardPaths>
 #include <QTemporaryDir>
 #include <QTest>
 
@@ -68,8 +70,23 @@ private Q_SLOTS:
     void produceRespectsTheUsersLines();
     void produceRefuses_data();
     void produceRefuses();
+    void reportPdfShowsTitleGridAndGraph();
+    void reportHtmlKeepsItsPicture();
+    void reportRefuses_data();
+    void reportRefuses();
+    void encodeGif();
+    void encodeGifRefuses_data();
+    void encodeGifRefuses();
 
 private:
+    Run report(const QStringList &extra)
+    {
+        return runCli(QStringList{u"report"_s, u"--settings"_s, demoFolder() + u"/settings.ini"_s,
+                                  u"--from"_s, u"2025-07"_s, u"--to"_s, u"2026-06"_s, u"--user"_s,
+                                  u"manager"_s, u"--password"_s, u"manager1"_s} +
+                      extra);
+    }
+
     QString demoFolder();
     QStringList produce(const QStringList &extra, int expectedExit = 0);
 
@@ -209,6 +226,153 @@ void TestCli::produceRefuses()
     QCOMPARE(run.exitCode, 2);
     QVERIFY2(run.err.contains(message), qPrintable(run.err));
     QCOMPARE(run.out, QString());
+}
+
+namespace {
+
+QString runTool(const QString &name, const QStringList &arguments)
+{
+    QProcess process;
+    process.start(QStandardPaths::findExecutable(name), arguments);
+    process.waitForFinished(60000);
+    return QString::fromUtf8(process.readAllStandardOutput());
+}
+
+// The topmost row holding a pixel of about that colour, or -1.
+int firstRowWith(const QImage &image, QRgb colour)
+{
+    for (int y = 0; y < image.height(); ++y) {
+        for (int x = 0; x < image.width(); ++x) {
+            const QRgb p = image.pixel(x, y);
+            if (std::abs(qRed(p) - qRed(colour)) < 8 && std::abs(qGreen(p) - qGreen(colour)) < 8 &&
+                std::abs(qBlue(p) - qBlue(colour)) < 8)
+                return y;
+        }
+    }
+    return -1;
+}
+
+} // namespace
+
+void TestCli::reportPdfShowsTitleGridAndGraph()
+{
+    if (QStandardPaths::findExecutable(u"pdftoppm"_s).isEmpty())
+        QFAIL("pdftotext and pdftoppm (poppler-utils) are needed; scripts/install-deps installs "
+              "them");
+    const QString pdf = m_dir.filePath(u"summary.pdf"_s);
+    const Run run = report({u"--out"_s, pdf});
+    QVERIFY2(run.exitCode == 0, qPrintable(run.err));
+
+    const QString text = runTool(u"pdftotext"_s, {u"-layout"_s, pdf, u"-"_s});
+    QVERIFY2(text.contains(u"1/7/25 to 30/6/26"_s), qPrintable(text));
+    // The text engine may set "fi" as one ligature glyph.
+    QVERIFY(text.contains(u"Panel labour gross pro"_s));
+    QVERIFY(text.contains(u"KEY PERFORMANCE INDICATORS"_s));
+    QVERIFY(text.contains(u"48.2%"_s));
+    QVERIFY(text.contains(u"Page 1 of 1"_s));
+
+    const QString prefix = m_dir.filePath(u"summary-page"_s);
+    runTool(u"pdftoppm"_s, {u"-png"_s, u"-r"_s, u"60"_s, u"-f"_s, u"1"_s, u"-l"_s, u"1"_s,
+                            u"-singlefile"_s, pdf, prefix});
+    const QImage page(prefix + u".png"_s);
+    QVERIFY(!page.isNull());
+    const int heading = firstRowWith(page, qRgb(0xDD, 0x68, 0x00)); // the grid's headings
+    const int bar = firstRowWith(page, qRgb(192, 255, 64));         // a green bar, reduced
+    QVERIFY(heading >= 0);
+    QVERIFY(bar >= 0);
+    QVERIFY(bar > heading); // the graph stands below the grid
+}
+
+void TestCli::reportHtmlKeepsItsPicture()
+{
+    const QString html = m_dir.filePath(u"compare.html"_s);
+    const Run run = report({u"--compare"_s, u"years"_s, u"--count"_s, u"2"_s, u"--out"_s, html});
+    QVERIFY2(run.exitCode == 0, qPrintable(run.err));
+    QFile file(html);
+    QVERIFY(file.open(QIODevice::ReadOnly));
+    const QString page = QString::fromUtf8(file.readAll());
+    const QString picture = m_dir.filePath(u"compare.bmp"_s);
+    QVERIFY(page.startsWith(u"<html>\r\n<body bgcolor='#ffffff'"_s));
+    QVERIFY(page.contains(u"Jul 23 - Jun 24"_s));
+    QVERIFY(page.contains(u"Jul 25 - Jun 26"_s));
+    QVERIFY(page.contains(u">Average</td>"_s));
+    QVERIFY(page.contains(u"<img src='"_s + picture + u"'>"_s));
+    QVERIFY(!QImage(picture).isNull());
+
+    const QString grid = m_dir.filePath(u"labour.html"_s);
+    QCOMPARE(report({u"--tab"_s, u"2"_s, u"--out"_s, grid}).exitCode, 0);
+    QFile labour(grid);
+    QVERIFY(labour.open(QIODevice::ReadOnly));
+    QVERIFY(!labour.readAll().contains("<img"));
+}
+
+void TestCli::reportRefuses_data()
+{
+    QTest::addColumn<QStringList>("arguments");
+    QTest::addColumn<QString>("message");
+    QTest::newRow("tab") << QStringList{u"--tab"_s, u"7"_s, u"--out"_s, u"x.pdf"_s}
+                         << u"--tab is a number from 0 to 6"_s;
+    QTest::newRow("no out") << QStringList{} << u"--out names a .html or .pdf file"_s;
+    QTest::newRow("text out") << QStringList{u"--out"_s, u"x.txt"_s}
+                              << u"--out names a .html or .pdf file"_s;
+    QTest::newRow("compare") << QStringList{u"--compare"_s, u"decades"_s, u"--out"_s, u"x.pdf"_s}
+                             << u"--compare is years or periods"_s;
+}
+
+void TestCli::reportRefuses()
+{
+    QFETCH(QStringList, arguments);
+    QFETCH(QString, message);
+    const Run run = report(arguments);
+    QCOMPARE(run.exitCode, 2);
+    QVERIFY2(run.err.contains(message), qPrintable(run.err));
+}
+
+void TestCli::encodeGif()
+{
+    QImage picture(40, 12, QImage::Format_RGB32);
+    picture.fill(Qt::white);
+    for (int x = 10; x < 30; ++x) {
+        for (int y = 2; y < 10; ++y)
+            picture.setPixel(x, y, qRgb(200, 60, 20));
+    }
+    const QString png = m_dir.filePath(u"picture.png"_s);
+    const QString gif = m_dir.filePath(u"picture.gif"_s);
+    QVERIFY(picture.save(png));
+    const Run run = runCli({u"encode-gif"_s, png, gif, u"--transparent"_s, u"FFFFFF"_s});
+    QVERIFY2(run.exitCode == 0, qPrintable(run.err));
+    QFile file(gif);
+    QVERIFY(file.open(QIODevice::ReadOnly));
+    const QByteArray bytes = file.readAll();
+    QVERIFY(bytes.startsWith("GIF89a"));
+    QCOMPARE(quint8(bytes[787]), 124); // white is the transparent entry
+    const QImage decoded = QImage(gif).convertToFormat(QImage::Format_ARGB32);
+    QCOMPARE(decoded.size(), picture.size());
+    QCOMPARE(qAlpha(decoded.pixel(0, 0)), 0);
+    QCOMPARE(decoded.pixel(15, 5), qRgb(192, 64, 0));
+}
+
+void TestCli::encodeGifRefuses_data()
+{
+    QTest::addColumn<QStringList>("arguments");
+    QTest::addColumn<int>("exitCode");
+    QTest::addColumn<QString>("message");
+    QTest::newRow("one file") << QStringList{u"a.png"_s} << 2 << u"usage"_s;
+    QTest::newRow("bad colour") << QStringList{u"a.png"_s, u"b.gif"_s, u"--transparent"_s,
+                                               u"white"_s}
+                                << 2 << u"RRGGBB"_s;
+    QTest::newRow("missing picture")
+        << QStringList{u"no-such.png"_s, u"b.gif"_s} << 1 << u"cannot read no-such.png"_s;
+}
+
+void TestCli::encodeGifRefuses()
+{
+    QFETCH(QStringList, arguments);
+    QFETCH(int, exitCode);
+    QFETCH(QString, message);
+    const Run run = runCli(QStringList{u"encode-gif"_s} + arguments);
+    QCOMPARE(run.exitCode, exitCode);
+    QVERIFY2(run.err.contains(message), qPrintable(run.err));
 }
 
 void TestCli::passwordRoundTrip_data()

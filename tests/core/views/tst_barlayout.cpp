@@ -17,6 +17,8 @@ private Q_SLOTS:
     void tooltips_data();
     void tooltips();
     void placement();
+    void compareLayout_data();
+    void compareLayout();
 
 private:
     NumberFormat m_numbers{QLocale(QLocale::English, QLocale::Australia)};
@@ -92,6 +94,37 @@ void TestBarLayout::placement()
     const auto compare = BarLayout::placeBars({1, 1, 2}, {10, 20, 30}, 15.0, 15.0, true);
     QCOMPARE(compare.at(1).left, 35 + 864);
     QCOMPARE(compare.at(2).left, 35 + 2 * 864 + 16);
+}
+
+void TestBarLayout::compareLayout_data()
+{
+    QTest::addColumn<QList<qint64>>("fields");
+    QTest::addColumn<int>("periods");
+    QTest::addColumn<int>("innerWidth");
+    QTest::addColumn<int>("width");
+    QTest::addColumn<QList<int>>("lefts");
+    // Two Fields over two periods: (3000 - 16 * 2 - 20) / 4 = 737.
+    QTest::newRow("pairs") << QList<qint64>{5, 5, 9, 9} << 2 << 3000 << 737
+                           << QList<int>{35, 772, 1525, 2262};
+    // Three periods, one Field: (1000 - 16 - 20) / 3 = 321.33 -> 321.
+    QTest::newRow("one field, N = 2")
+        << QList<qint64>{7, 7, 7} << 3 << 1000 << 321 << QList<int>{35, 356, 677};
+    // A window far too narrow still gives every bar a width.
+    QTest::newRow("narrow") << QList<qint64>{1, 2} << 1 << 10 << 1 << QList<int>{35, 52};
+    QTest::newRow("no bars") << QList<qint64>{} << 2 << 3000 << 0 << QList<int>{};
+}
+
+void TestBarLayout::compareLayout()
+{
+    QFETCH(QList<qint64>, fields);
+    QFETCH(int, periods);
+    QFETCH(int, innerWidth);
+    QFETCH(int, width);
+    QFETCH(QList<int>, lefts);
+    const BarLayout::CompareLayout layout =
+        BarLayout::layoutCompareBars(fields, periods, BarLayout::FirstLeft, innerWidth);
+    QCOMPARE(layout.barWidth, width);
+    QCOMPARE(layout.lefts, lefts);
 }
 
 QTEST_GUILESS_MAIN(TestBarLayout)

@@ -100,9 +100,11 @@ void TestKpiWidgets::graphPlacesBarsAndLabels()
     QVERIFY(graph.variantLabels().at(0)->y() < graph.bars().at(0)->y());
     QCOMPARE(graph.bars().at(1)->toolTip(), u"-3%"_s);
 
-    graph.setBars({{16, u">45"_s, 50.0}, {16, u">45"_s, 40.0}}, true);
+    // Two periods of one Field share the width and touch.
+    graph.setBars({{16, u">45"_s, 50.0}, {16, u">45"_s, 40.0}}, true, 2);
     QVERIFY(graph.variantLabels().isEmpty());
-    QCOMPARE(graph.bars().at(1)->x(), GraphArea::ScaleMargin + 60); // periods of one Field touch
+    QCOMPARE(graph.bars().at(1)->x(), graph.bars().at(0)->x() + graph.bars().at(0)->width());
+    QVERIFY(qAbs(graph.bars().at(0)->width() - (graph.width() - GraphArea::ScaleMargin) / 2) <= 2);
 }
 
 void TestKpiWidgets::barFocusNamesItsField()
