@@ -5,6 +5,9 @@
 #include "app/loadingwindow.h"
 #include "app/webpages.h"
 #include "report/gridreport.h"
+#include "setup/hourlyratesdialog.h"
+#include "setup/programsetupdialog.h"
+#include "users/useraccountsdialog.h"
 #include "views/comparewindow.h"
 #include "views/grapharea.h"
 #include "views/kpitabview.h"
@@ -97,13 +100,13 @@ void MainWindow::buildMenus()
 
     QMenu *setup = menuBar()->addMenu(u"&Setup"_s);
     m_menuSetup = setup->menuAction();
-    // The setup dialogs arrive with the administration work; until then they stay disabled.
-    setup->addAction(u"&Labour Hours"_s)->setEnabled(false);
-    m_itemSetupMapping = setup->addAction(u"&Account Mapping"_s);
-    m_itemSetupMapping->setEnabled(false);
+    m_itemSetupHours = setup->addAction(u"&Labour Hours"_s, this,
+                                        [this] { HourlyRatesDialog::showModal(m_context, this); });
+    m_itemSetupMapping = setup->addAction(
+        u"&Account Mapping"_s, this, [this] { ProgramSetupDialog::showModal(m_context, this); });
     setup->addSeparator();
-    m_itemSetupUsers = setup->addAction(u"&User Accounts"_s);
-    m_itemSetupUsers->setEnabled(false);
+    m_itemSetupUsers = setup->addAction(u"&User Accounts"_s, this,
+                                        [this] { UserAccountsDialog::showModal(m_context, this); });
     setup->addAction(u"System &Configuration"_s, this, [this] {
         if (ConfigDialog::modify(this, m_context.settingsStore(), m_prompter)) {
             m_prompter.message(u"You must restart the program for the changes to take effect!"_s,
@@ -311,8 +314,13 @@ void MainWindow::updateLoginState()
     const LoginState &login = m_context.loginState();
     m_pages->setCurrentIndex(login.loggedIn ? 1 : 0);
     statusBar()->setVisible(login.loggedIn);
-    m_menuSetup->setEnabled(login.loggedIn && login.currentUserType == 1);
+    const bool administrator = login.loggedIn && login.currentUserType == 1;
+    m_menuSetup->setEnabled(administrator);
+    m_itemSetupUsers->setEnabled(administrator);
+    m_itemSetupMapping->setEnabled(login.loggedIn &&
+                                   login.currentUser == LoginService::BuiltInUser);
     m_itemLogoff->setEnabled(login.loggedIn);
+    m_itemPrint->setEnabled(login.loggedIn);
 }
 
 void MainWindow::login(const QString &userName, const QString &password)

@@ -60,6 +60,9 @@ public:
     QLabel *lblDT() const { return m_lblDT; }
     QAction *itemLogoff() const { return m_itemLogoff; }
     QAction *itemPrint() const { return m_itemPrint; }
+    QAction *itemSetupHours() const { return m_itemSetupHours; }
+    QAction *itemSetupMapping() const { return m_itemSetupMapping; }
+    QAction *itemSetupUsers() const { return m_itemSetupUsers; }
     QAction *menuSetup() const { return m_menuSetup; }
 
     static QString clockText(const QDateTime &moment);
@@ -107,6 +110,7 @@ private:
     QAction *m_itemPrint = nullptr;
     QAction *m_menuSetup = nullptr;
     QAction *m_itemSetupUsers = nullptr;
+    QAction *m_itemSetupHours = nullptr;
     QAction *m_itemSetupMapping = nullptr;
     QTimer *m_tmrUsers = nullptr;
     QTimer *m_tmrDT = nullptr;

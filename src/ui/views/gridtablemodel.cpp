@@ -36,6 +36,9 @@ QVariant GridTableModel::data(const QModelIndex &index, int role) const
     switch (role) {
     case Qt::DisplayRole:
         return m_grid.cellText(row, column);
+    case Qt::DecorationRole:
+        return cell.icon >= 0 && cell.icon < m_icons.size() ? QVariant(m_icons.at(cell.icon))
+                                                            : QVariant();
     case Qt::BackgroundRole:
         return cell.back ? QVariant(*cell.back) : QVariant();
     case Qt::ForegroundRole:

@@ -2,6 +2,8 @@
 #pragma once
 
 #include <QAbstractTableModel>
+#include <QIcon>
+#include <QList>
 #include <QPointer>
 
 class GridModel;
@@ -22,7 +24,10 @@ public:
                         int role = Qt::DisplayRole) const override;
 
     GridModel &grid() { return m_grid; }
+    // The pictures a cell's icon number stands for.
+    void setIcons(const QList<QIcon> &icons) { m_icons = icons; }
 
 private:
     GridModel &m_grid;
+    QList<QIcon> m_icons;
 };

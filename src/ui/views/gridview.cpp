@@ -6,6 +6,7 @@
 #include "views/gridmodel.h"
 
 #include <QHeaderView>
+#include <QKeyEvent>
 
 GridView::GridView(GridModel &grid, QWidget *parent)
     : QTableView(parent)
@@ -24,12 +25,25 @@ GridView::GridView(GridModel &grid, QWidget *parent)
         QStringLiteral("QTableView::item:selected { background: #FFCC43; color: black; }"));
 
     connect(m_model, &QAbstractItemModel::modelReset, this, &GridView::applyLayout);
+    // A window may destroy its grid before the view that shows it (members go before child
+    // widgets); from then on the view shows nothing rather than reading a grid that is gone.
+    connect(&m_grid, &QObject::destroyed, this, [this] {
+        setModel(nullptr);
+        m_gridAlive = false;
+    });
     connect(horizontalHeader(), &QHeaderView::sectionClicked, this,
             [this](int section) { Q_EMIT headerClicked(section + 1); });
     connect(this, &QTableView::clicked, this, [this](const QModelIndex &index) {
         m_grid.setSelectedRow(index.row() + 1);
         Q_EMIT cellPicked(index.row() + 1, index.column() + 1);
+        Q_EMIT editRequested(index.row() + 1, index.column() + 1, QChar());
     });
+    // Moving with the keyboard selects as a click does.
+    connect(selectionModel(), &QItemSelectionModel::currentRowChanged, this,
+            [this](const QModelIndex &current) {
+                if (current.isValid() && current.row() + 1 != m_grid.selectedRow())
+                    m_grid.setSelectedRow(current.row() + 1);
+            });
     connect(&m_grid, &GridModel::selectionChanged, this, [this](int row) {
         if (row > 0)
             selectRow(row - 1);
@@ -39,6 +53,35 @@ GridView::GridView(GridModel &grid, QWidget *parent)
     applyLayout();
 }
 
+void GridView::setIcons(const QList<QIcon> &icons)
+{
+    m_model->setIcons(icons);
+    viewport()->update();
+}
+
+void GridView::keyPressEvent(QKeyEvent *event)
+{
+    if (!m_cellEditing) {
+        QTableView::keyPressEvent(event);
+        return;
+    }
+    const QModelIndex current = currentIndex();
+    const int row = current.isValid() ? current.row() + 1 : m_grid.selectedRow();
+    const int column = current.isValid() ? current.column() + 1 : 1;
+    const QString typed = event->text();
+    if (row > 0 && (event->key() == Qt::Key_F2 || event->key() == Qt::Key_Return ||
+                    event->key() == Qt::Key_Enter)) {
+        Q_EMIT editRequested(row, column, QChar());
+        return;
+    }
+    if (row > 0 && typed.size() == 1 && typed.at(0).isPrint() &&
+        !(event->modifiers() & (Qt::ControlModifier | Qt::AltModifier))) {
+        Q_EMIT editRequested(row, column, typed.at(0));
+        return;
+    }
+    QTableView::keyPressEvent(event);
+}
+
 QRect GridView::cellRect(int row, int column) const
 {
     return visualRect(m_model->index(row - 1, column - 1));
@@ -46,6 +89,8 @@ QRect GridView::cellRect(int row, int column) const
 
 void GridView::applyLayout()
 {
+    if (!m_gridAlive)
+        return;
     for (int c = 1; c <= m_grid.columnCount(); ++c) {
         const GridModel::Column &column = m_grid.column(c);
         setColumnHidden(c - 1, !column.visible || column.width == 0);

@@ -16,16 +16,27 @@ public:
     explicit GridView(GridModel &grid, QWidget *parent = nullptr);
 
     GridModel &grid() { return m_grid; }
+    void setIcons(const QList<QIcon> &icons);
+    // With cell editing on, typed characters, Enter and F2 ask to edit the current cell
+    // instead of searching the list.
+    void setCellEditing(bool on) { m_cellEditing = on; }
+    // Column widths, hidden columns and rows as the grid model now has them.
+    void applyLayout();
     // The cell's rectangle in the view's coordinates, for panels opened under it.
     QRect cellRect(int row, int column) const;
 
 Q_SIGNALS:
     void headerClicked(int column);
     void cellPicked(int row, int column);
+    // A click, a typed character (key) or Enter/F2 (no key) on a cell asks to edit it.
+    void editRequested(int row, int column, QChar key);
+
+protected:
+    void keyPressEvent(QKeyEvent *event) override;
 
 private:
-    void applyLayout();
-
     GridModel &m_grid;
     GridTableModel *m_model;
+    bool m_cellEditing = false;
+    bool m_gridAlive = true;
 };

@@ -1,0 +1,77 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "hourlyrates.h"
+
+#include "app/appcontext.h"
+#include "app/errorreporter.h"
+#include "app/numberformat.h"
+#include "database/maindatabase.h"
+#include "database/recordoperations.h"
+#include "views/gridoperations.h"
+
+using namespace Qt::StringLiterals;
+
+HourlyRates::HourlyRates(AppContext &context)
+    : m_context(context)
+    , m_list(m_grid, {RateColumn, 0})
+{}
+
+int HourlyRates::departmentWidth(int gridWidth, int scrollBarHeight)
+{
+    return std::max(16, gridWidth - RateWidth - scrollBarHeight - 4);
+}
+
+void HourlyRates::load()
+{
+    m_grid.addColumn(u"id"_s, QString(), GridModel::AlignLeft, 0, true);
+    m_grid.addColumn(u"department"_s, u"Department"_s, GridModel::AlignLeft, 200, true);
+    m_grid.addColumn(u"value"_s, u"Rate $/hour"_s, GridModel::AlignLeft, RateWidth, true);
+    GridOperations::setupGrid(m_grid);
+
+    MainDatabase &database = m_context.mainDatabase();
+    // The standing record set is read again too, so that the save compares with what this
+    // list shows and not with what was there when the program started.
+    if (const std::optional<DbError> failure = database.hoursRecordset().requery()) {
+        ErrorReporter(m_context.prompter())
+            .reportError(failure->number, failure->description, u"Labour Hours"_s);
+    }
+    RecordOperations::Query query =
+        RecordOperations(database, m_context.prompter()).openQuery(u"Hours"_s, QString(), true);
+    if (query.error) {
+        ErrorReporter(m_context.prompter())
+            .reportError(query.error->number, query.error->description, u"Labour Hours"_s);
+        return;
+    }
+    GridOperations::fillGrid(m_grid, query.records, false);
+    m_grid.setRedraw(false);
+    for (int row = 1; row <= m_grid.rowCount(); ++row) {
+        m_grid.editCell(row, RateColumn).back = GridOperations::EditableBack;
+        // Stored rates are shown as money too, the way an edited rate is; an empty rate
+        // stays empty. The list holds them as the database wrote them, in C notation.
+        bool isNumber = false;
+        const double rate = QLocale::c().toDouble(m_grid.cellText(row, RateColumn), &isNumber);
+        if (isNumber)
+            m_grid.setCellText(row, RateColumn, m_context.numberFormat().formatMoney(rate, false));
+    }
+    m_grid.setRedraw(true);
+}
+
+void HourlyRates::commitEdit(int row, const QString &text)
+{
+    if (row < 1 || row > m_grid.rowCount())
+        return;
+    const NumberFormat &numbers = m_context.numberFormat();
+    const std::optional<double> rate = numbers.parseNumber(text);
+    m_grid.setCellText(row, RateColumn, rate ? numbers.formatMoney(*rate, false) : u"0"_s);
+}
+
+bool HourlyRates::save()
+{
+    MainDatabase &database = m_context.mainDatabase();
+    const NumberFormat &numbers = m_context.numberFormat();
+    const bool saved = m_list.saveInto(
+        m_context, database.hoursRecordset(), u"Hours"_s, u"Value"_s,
+        [&numbers](const QString &text) { return QVariant(numbers.toNumber(text)); },
+        u"Save Labour Hours"_s);
+    database.hoursRecordset().requery();
+    return saved;
+}

@@ -1,0 +1,36 @@
+// Veltrix — KPI dashboard for small businesses.
+#pragma once
+
+#include "setuplist.h"
+
+#include "views/gridmodel.h"
+
+class AppContext;
+
+// The Labour Hours list: one hourly rate per department, kept in the Hours table and read by
+// the formulas that cost labour.
+class HourlyRates
+{
+public:
+    static constexpr int RateColumn = 3;
+    static constexpr int RateWidth = 100;
+
+    explicit HourlyRates(AppContext &context);
+
+    // Reads the departments and their rates; the rate cells are marked editable.
+    void load();
+    GridModel &grid() { return m_grid; }
+    // A finished edit of a row's rate: a number is shown as money ("1,234.50"), anything
+    // else as 0.
+    void commitEdit(int row, const QString &text);
+    // Writes every rate; false when a failure stopped it (reported under "Save Labour Hours").
+    bool save();
+
+    // The department column takes what the rate leaves of the grid's width.
+    static int departmentWidth(int gridWidth, int scrollBarHeight);
+
+private:
+    AppContext &m_context;
+    GridModel m_grid;
+    SetupList m_list;
+};
