@@ -98,10 +98,13 @@ private Q_SLOTS:
     void fieldDeletedMeanwhileIsSkipped();
 
 private:
+    // Starts up on the workspace; the note about a new database file is not what is tested.
     bool connect()
     {
-        return loadSettings(m_workspace->context()).isEmpty() &&
-               connectMainDatabase(m_workspace->context()).isEmpty();
+        const bool connected = loadSettings(m_workspace->context()).isEmpty() &&
+                               connectMainDatabase(m_workspace->context()).isEmpty();
+        m_workspace->prompter().clearMessages();
+        return connected;
     }
     QVariant stored(const QString &sql, const QVariantList &values = {})
     {
