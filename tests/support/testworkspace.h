@@ -19,13 +19,13 @@
 class TestWorkspace
 {
 public:
-    TestWorkspace()
+    explicit TestWorkspace(Clock clock = {})
     {
         QDir(m_root.path()).mkpath(QStringLiteral("app"));
         QDir(m_root.path()).mkpath(QStringLiteral("shared"));
         m_context = std::make_unique<AppContext>(
             std::make_unique<SettingsStore>(m_root.filePath(QStringLiteral("settings.ini"))),
-            m_prompter, AppLocations::inFolder(appFolder()));
+            m_prompter, AppLocations::inFolder(appFolder()), std::move(clock));
     }
 
     QString appFolder() const { return m_root.filePath(QStringLiteral("app")) + u'/'; }

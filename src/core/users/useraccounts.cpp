@@ -91,6 +91,13 @@ void UserAccounts::refreshForm(bool requery)
 
 void UserAccounts::updateSelId(int row, qint64 id)
 {
+    // While an account is being added or edited the boxes keep what was typed and the edit
+    // keeps its account, even when the list is read again (after a delete, say): the edit
+    // must never be saved into whichever account the list selects next.
+    if (m_editing) {
+        Q_EMIT changed();
+        return;
+    }
     if (row == 0)
         row = m_users.selectedRow();
     if (id < 1)
@@ -279,7 +286,7 @@ bool UserAccounts::saveChanges()
         return false;
     setEditMode(false);
     m_mode = Mode::Browsing;
-    Q_EMIT changed();
+    updateSelId(0, 0);
     return true;
 }
 

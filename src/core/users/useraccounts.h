@@ -47,6 +47,7 @@ public:
 
     void refreshForm(bool requery);
     // Shows the account of the row (0: the selected row); an ID below 1 is read from the row.
+    // While adding or editing, the account being edited stays the one shown.
     void updateSelId(int row, qint64 id);
     void selectUser(int row);
     void headerClicked(int column);

@@ -1,4 +1,5 @@
 // Veltrix — KPI dashboard for small businesses.
+#include "modalwindow.h"
 #include "testworkspace.h"
 
 #include "app/demoworkspace.h"
@@ -6,12 +7,22 @@
 #include "database/configvalues.h"
 #include "database/mainconnector.h"
 #include "main/mainwindow.h"
+#include "setup/celleditor.h"
+#include "setup/hourlyratesdialog.h"
+#include "setup/programsetupdialog.h"
 #include "views/gridmodel.h"
+#include "views/gridview.h"
 #include "views/kpitabview.h"
 
 #include <QComboBox>
+#include <QJsonArray>
+#include <QJsonDocument>
+#include <QJsonObject>
 #include <QLabel>
 #include <QLineEdit>
+#include <QMenu>
+#include <QProcess>
+#include <QPushButton>
 #include <QSqlQuery>
 #include <QTest>
 
@@ -36,6 +47,9 @@ private Q_SLOTS:
     void twoWindowsCountToTwoAndBack();
     void shutdownRequestClosesTheWindow();
     void produceShowsTheDemoFigures();
+    void setupMenuFollowsTheUser_data();
+    void setupMenuFollowsTheUser();
+    void mappingAndRatesReachTheNextProduce();
 
 private:
     static bool connectWorkspace(TestWorkspace &workspace)
@@ -283,6 +297,127 @@ void TestMainWindow::produceShowsTheDemoFigures()
     // The same text veltrix-cli produce prints for this line and range.
     QCOMPARE(grid.cellText(2, grid.columnIndex(u"value"_s)), u"48.2%"_s);
     QCOMPARE(m_workspace->store().readSetting(u"M1"_s), u"6"_s);
+}
+
+void TestMainWindow::setupMenuFollowsTheUser_data()
+{
+    QTest::addColumn<QString>("user");
+    QTest::addColumn<QString>("password");
+    QTest::addColumn<bool>("menu");
+    QTest::addColumn<bool>("mapping");
+    QTest::newRow("built-in account") << u"sysop"_s << u"sysop"_s << true << true;
+    QTest::newRow("administrator") << u"manager"_s << u"manager1"_s << true << false;
+    QTest::newRow("standard user") << u"workshop"_s << u"panel1"_s << false << false;
+}
+
+void TestMainWindow::setupMenuFollowsTheUser()
+{
+    QFETCH(QString, user);
+    QFETCH(QString, password);
+    QFETCH(bool, menu);
+    QFETCH(bool, mapping);
+    QTemporaryDir dir;
+    QCOMPARE(DemoWorkspace::create(dir.filePath(u"demo"_s), QStringLiteral(VELTRIX_NEW_DB)),
+             std::nullopt);
+    DemoWorkspace::configure(m_workspace->store(), dir.filePath(u"demo"_s));
+    auto window = openWindow(*m_workspace);
+    QVERIFY(window);
+    window->login(user, password);
+    QCOMPARE(window->menuSetup()->isEnabled(), menu);
+    QCOMPARE(window->itemSetupUsers()->isEnabled(), menu);
+    QCOMPARE(window->itemSetupMapping()->isEnabled(), mapping);
+    QVERIFY(window->itemPrint()->isEnabled());
+    window->logoff(true);
+    QVERIFY(!window->menuSetup()->isEnabled());
+    QVERIFY(!window->itemPrint()->isEnabled());
+}
+
+namespace {
+
+// Types into a setup list's cell through the edit box, as the user does.
+void editCell(GridView *view, CellEditor *editor, int row, int column, const QString &text)
+{
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, {}, view->cellRect(row, column).center());
+    QVERIFY(editor->isOpen());
+    editor->clear();
+    QTest::keyClicks(editor, text);
+    QTest::keyClick(editor, Qt::Key_Return);
+}
+
+int rowWithId(const GridModel &grid, const QString &id)
+{
+    for (int row = 1; row <= grid.rowCount(); ++row) {
+        if (grid.cellText(row, 1) == id)
+            return row;
+    }
+    return 0;
+}
+
+// veltrix-cli produce's display text of each Field, by ID.
+QHash<QString, QString> cliFigures(const QString &settings, const QString &home)
+{
+    QProcess process;
+    QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
+    environment.insert(u"XDG_CONFIG_HOME"_s, home + u"/config"_s);
+    environment.insert(u"XDG_DATA_HOME"_s, home + u"/data"_s);
+    process.setProcessEnvironment(environment);
+    process.start(QStringLiteral(VELTRIX_CLI),
+                  {u"produce"_s, u"--settings"_s, settings, u"--from"_s, u"2025-07"_s, u"--to"_s,
+                   u"2026-06"_s, u"--user"_s, u"sysop"_s, u"--password"_s, u"sysop"_s,
+                   u"--format"_s, u"json"_s});
+    QHash<QString, QString> figures;
+    if (!process.waitForFinished(120000))
+        return figures;
+    const QJsonArray records = QJsonDocument::fromJson(process.readAllStandardOutput()).array();
+    for (const QJsonValue &record : records)
+        figures.insert(record[u"id"_s].toString(), record[u"display"_s].toString());
+    return figures;
+}
+
+} // namespace
+
+void TestMainWindow::mappingAndRatesReachTheNextProduce()
+{
+    QTemporaryDir dir;
+    const QString demo = dir.filePath(u"demo"_s);
+    QCOMPARE(DemoWorkspace::create(demo, QStringLiteral(VELTRIX_NEW_DB)), std::nullopt);
+    DemoWorkspace::configure(m_workspace->store(), demo);
+    auto window = openWindow(*m_workspace);
+    QVERIFY(window);
+    window->login(u"sysop"_s, u"sysop"_s);
+    window->produce();
+    const auto valueOf = [&](const QString &id) {
+        window->selectTab(0);
+        GridModel &grid = window->tabView()->grid();
+        return grid.cellText(rowWithId(grid, id), grid.columnIndex(u"value"_s));
+    };
+    const QString salesBefore = valueOf(u"13"_s);
+    const QString hoursBefore = valueOf(u"62"_s);
+
+    // Panel labour sales now also take the paint labour account; panel labour costs $50 an
+    // hour.
+    whenModalOpens<ProgramSetupDialog>([](ProgramSetupDialog &dialog) {
+        const int row = rowWithId(dialog.setup().grid(ProgramSetup::Mapping), u"13"_s);
+        editCell(dialog.lstA(), dialog.txtEdit(), row, 4, u" 4-1100+4-1200 "_s);
+        dialog.butOK()->click();
+    });
+    window->itemSetupMapping()->trigger();
+    whenModalOpens<HourlyRatesDialog>([](HourlyRatesDialog &dialog) {
+        editCell(dialog.lstRates(), dialog.txtEdit(), 1, 3, u"50"_s);
+        dialog.butOK()->click();
+    });
+    window->itemSetupHours()->trigger();
+    QVERIFY(m_workspace->prompter().messages().isEmpty());
+
+    window->produce();
+    const QString salesAfter = valueOf(u"13"_s);
+    const QString hoursAfter = valueOf(u"62"_s);
+    QVERIFY(salesAfter != salesBefore);
+    QVERIFY(hoursAfter != hoursBefore);
+    const QHash<QString, QString> cli = cliFigures(demo + u"/settings.ini"_s, dir.path());
+    QCOMPARE(cli.value(u"13"_s), salesAfter);
+    QCOMPARE(cli.value(u"62"_s), hoursAfter);
+    window->logoff(true);
 }
 
 QTEST_MAIN(TestMainWindow)

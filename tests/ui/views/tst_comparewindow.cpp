@@ -1,4 +1,5 @@
 // Veltrix — KPI dashboard for small businesses.
+#include "modalwindow.h"
 #include "testworkspace.h"
 
 #include "app/demoworkspace.h"
@@ -29,21 +30,6 @@
 using namespace Qt::StringLiterals;
 
 namespace {
-
-// Runs the action on the first modal window of type T that opens, then closes it.
-template<typename T> void whenModalOpens(std::function<void(T &)> action)
-{
-    auto *poll = new QTimer;
-    QObject::connect(poll, &QTimer::timeout, poll, [poll, action] {
-        if (auto *window = qobject_cast<T *>(QApplication::activeModalWidget())) {
-            poll->stop();
-            poll->deleteLater();
-            action(*window);
-            window->reject();
-        }
-    });
-    poll->start(10);
-}
 
 bool waitUntilLoaded(CompareWindow &window)
 {

@@ -1,0 +1,395 @@
+// Veltrix — KPI dashboard for small businesses.
+#include "testworkspace.h"
+
+#include "app/settingsloader.h"
+#include "database/mainconnector.h"
+#include "users/loginservice.h"
+#include "users/useraccountsdialog.h"
+#include "views/gridview.h"
+
+#include <QComboBox>
+#include <QHeaderView>
+#include <QLineEdit>
+#include <QPushButton>
+#include <QSqlQuery>
+#include <QTest>
+
+using namespace Qt::StringLiterals;
+
+namespace {
+
+const QDateTime Now(QDate(2026, 12, 6), QTime(14, 5));
+
+struct StoredUser
+{
+    QString name;
+    QString password;
+    int type = 0;
+    QString created;
+    QString fields;
+};
+
+} // namespace
+
+class TestUserAccountsDialog : public QObject
+{
+    Q_OBJECT
+
+private Q_SLOTS:
+    void init();
+    void cleanup();
+    void opensOnTheFirstNameWithItsTicks();
+    void refusedSaves_data();
+    void refusedSaves();
+    void addsAnAccountThatLogsIn_data();
+    void addsAnAccountThatLogsIn();
+    void noTicksIsStoredAsHash();
+    void editingMayTakeAnotherAccountsName();
+    void deleteWhileEditingThenSave();
+    void cancelShowsTheStoredValues();
+    void allAndNoneLeaveHeadings();
+    void headerClicksSort();
+    void closingWhileEditingAsks_data();
+    void closingWhileEditingAsks();
+
+private:
+    void addUser(const QString &name, const QString &password, int type, const QString &fields)
+    {
+        QSqlQuery query(m_workspace->context().mainDatabase().database());
+        query.prepare(u"INSERT INTO Users (UserName, Password, Type, DateCreated, Fields) "
+                      u"VALUES (?, ?, ?, '1 Jan 2026 9:00 AM', ?)"_s);
+        for (const QVariant &value : QVariantList{name, password, type, fields})
+            query.addBindValue(value);
+        QVERIFY(query.exec());
+    }
+    std::optional<StoredUser> stored(const QString &name)
+    {
+        QSqlQuery query(m_workspace->context().mainDatabase().database());
+        query.prepare(u"SELECT UserName, Password, Type, DateCreated, Fields FROM Users "
+                      u"WHERE UserName = ?"_s);
+        query.addBindValue(name);
+        if (!query.exec() || !query.next())
+            return std::nullopt;
+        return StoredUser{query.value(0).toString(), query.value(1).toString(),
+                          query.value(2).toInt(), query.value(3).toString(),
+                          query.value(4).toString()};
+    }
+    int userCount()
+    {
+        QSqlQuery query(u"SELECT COUNT(*) FROM Users"_s,
+                        m_workspace->context().mainDatabase().database());
+        return query.next() ? query.value(0).toInt() : -1;
+    }
+    int rowOfUser(UserAccountsDialog &dialog, const QString &name)
+    {
+        const GridModel &users = dialog.accounts().users();
+        for (int row = 1; row <= users.rowCount(); ++row) {
+            if (users.cellText(row, 2) == name)
+                return row;
+        }
+        return 0;
+    }
+    // Ticks of the KPI lines, by Field ID.
+    QStringList ticked(UserAccountsDialog &dialog)
+    {
+        QStringList ids;
+        const GridModel &fields = dialog.accounts().fields();
+        for (int row = 1; row <= fields.rowCount(); ++row) {
+            if (fields.cell(row, 2).icon == UserAccounts::Ticked)
+                ids << fields.cellText(row, 1);
+        }
+        return ids;
+    }
+    void clickLine(UserAccountsDialog &dialog, const QString &id)
+    {
+        const GridModel &fields = dialog.accounts().fields();
+        for (int row = 1; row <= fields.rowCount(); ++row) {
+            if (fields.cellText(row, 1) == id) {
+                const QRect cell = dialog.lstFields()->cellRect(row, 2);
+                QTest::mouseClick(dialog.lstFields()->viewport(), Qt::LeftButton, {},
+                                  cell.center());
+                return;
+            }
+        }
+        QFAIL("no such line");
+    }
+    void type(QLineEdit *box, const QString &text)
+    {
+        box->selectAll();
+        QTest::keyClick(box, Qt::Key_Delete);
+        QTest::keyClicks(box, text);
+    }
+    QString lastMessage() const
+    {
+        const auto &messages = m_workspace->prompter().messages();
+        return messages.isEmpty() ? QString() : messages.last().text;
+    }
+
+    std::unique_ptr<TestWorkspace> m_workspace;
+};
+
+void TestUserAccountsDialog::init()
+{
+    m_workspace = std::make_unique<TestWorkspace>(Clock::fixedAt(Now));
+    QVERIFY(m_workspace->configure());
+    QCOMPARE(loadSettings(m_workspace->context()), QString());
+    QCOMPARE(connectMainDatabase(m_workspace->context()), QString());
+    addUser(u"Bob"_s, u"bob1"_s, 0, u"1,2,3#13"_s);
+    addUser(u"Anna"_s, u"anna1"_s, 1, u"1,999,#2"_s);
+    m_workspace->prompter().clearMessages();
+}
+
+void TestUserAccountsDialog::cleanup()
+{
+    disconnectMainDatabase(m_workspace->context());
+    m_workspace.reset();
+}
+
+void TestUserAccountsDialog::opensOnTheFirstNameWithItsTicks()
+{
+    UserAccountsDialog dialog(m_workspace->context());
+    QCOMPARE(dialog.windowTitle(), u" User Accounts"_s);
+    QCOMPARE(dialog.accounts().users().rowCount(), 2);
+    QCOMPARE(dialog.accounts().users().cellText(1, 2), u"Anna"_s); // sorted by name
+    QCOMPARE(dialog.txtUsername()->text(), u"Anna"_s);
+    QCOMPARE(dialog.txtPassword()->text(), u"anna1"_s);
+    QCOMPARE(dialog.lstType()->currentText(), u"Administrator"_s);
+    // 999 is no longer listed: the other ticks show without complaint.
+    QCOMPARE(ticked(dialog), (QStringList{u"1"_s, u"2"_s}));
+    QVERIFY(!dialog.txtUsername()->isEnabled());
+    QVERIFY(!dialog.button(u"butSaveChanges"_s)->isEnabled());
+    QVERIFY(dialog.button(u"butEdit"_s)->isEnabled());
+    QCOMPARE(dialog.txtUsername()->maxLength(), 16);
+    QCOMPARE(dialog.txtPassword()->maxLength(), 8);
+
+    dialog.accounts().selectUser(rowOfUser(dialog, u"Bob"_s));
+    QCOMPARE(dialog.txtUsername()->text(), u"Bob"_s);
+    QCOMPARE(ticked(dialog), (QStringList{u"1"_s, u"2"_s, u"3"_s, u"13"_s}));
+    // Headings carry no tick at all.
+    const GridModel &fields = dialog.accounts().fields();
+    QCOMPARE(fields.cellText(1, 1), u"9"_s);
+    QCOMPARE(fields.cell(1, 2).icon, int(UserAccounts::NoIcon));
+}
+
+void TestUserAccountsDialog::refusedSaves_data()
+{
+    QTest::addColumn<QString>("name");
+    QTest::addColumn<QString>("password");
+    QTest::addColumn<QString>("reason");
+    QTest::newRow("bob when Bob exists")
+        << u"bob"_s << u"pw"_s << u"That username already exists"_s;
+    QTest::newRow("name of spaces") << u"   "_s << u"pw"_s << u"You must specify the Username!"_s;
+    QTest::newRow("no password") << u"Carl"_s << u"  "_s << u"You must specify the Password!"_s;
+    QTest::newRow("nothing") << QString() << QString() << u"You must specify the Username!"_s;
+}
+
+void TestUserAccountsDialog::refusedSaves()
+{
+    QFETCH(QString, name);
+    QFETCH(QString, password);
+    QFETCH(QString, reason);
+    UserAccountsDialog dialog(m_workspace->context());
+    dialog.button(u"butAdd"_s)->click();
+    QVERIFY(dialog.txtUsername()->isEnabled());
+    QVERIFY(!dialog.lstUsers()->isEnabled());
+    QCOMPARE(ticked(dialog), QStringList());
+    type(dialog.txtUsername(), name);
+    type(dialog.txtPassword(), password);
+    dialog.button(u"butSaveChanges"_s)->click();
+
+    QCOMPARE(lastMessage(), reason + u"\r\n\r\nChanges to the user have not been saved!"_s);
+    QCOMPARE(m_workspace->prompter().messages().last().title, u"Cannot Save"_s);
+    QCOMPARE(m_workspace->prompter().messages().last().icon, Prompter::Icon::Exclamation);
+    // Still adding, so that the entry can be corrected.
+    QCOMPARE(dialog.accounts().mode(), UserAccounts::Mode::Adding);
+    QVERIFY(dialog.txtUsername()->isEnabled());
+    QCOMPARE(userCount(), 2);
+}
+
+void TestUserAccountsDialog::addsAnAccountThatLogsIn_data()
+{
+    QTest::addColumn<QString>("name");
+    QTest::addColumn<QString>("password");
+    QTest::newRow("apostrophe") << u"O'Brien"_s << u"it's"_s;
+    QTest::newRow("percent") << u"50% Panel"_s << u"100%"_s;
+    QTest::newRow("trailing space") << u"Carl "_s << u"carl1"_s;
+    QTest::newRow("quote and underscore") << u"\"Max\"_2"_s << u"m_x"_s;
+}
+
+void TestUserAccountsDialog::addsAnAccountThatLogsIn()
+{
+    QFETCH(QString, name);
+    QFETCH(QString, password);
+    UserAccountsDialog dialog(m_workspace->context());
+    dialog.button(u"butAdd"_s)->click();
+    type(dialog.txtUsername(), name);
+    type(dialog.txtPassword(), password);
+    dialog.lstType()->setCurrentIndex(1);
+    clickLine(dialog, u"2"_s);
+    clickLine(dialog, u"13"_s);
+    clickLine(dialog, u"2"_s); // and off again
+    clickLine(dialog, u"1"_s);
+    dialog.button(u"butSaveChanges"_s)->click();
+
+    QVERIFY2(m_workspace->prompter().messages().isEmpty(), qPrintable(lastMessage()));
+    QCOMPARE(dialog.accounts().mode(), UserAccounts::Mode::Browsing);
+    QVERIFY(!dialog.txtUsername()->isEnabled());
+    const std::optional<StoredUser> user = stored(name);
+    QVERIFY(user);
+    QCOMPARE(user->password, password);
+    QCOMPARE(user->type, 1);
+    QCOMPARE(user->fields, u"1,13"_s); // in list order
+    QCOMPARE(user->created, u"6 Dec 2026 2:05 PM"_s);
+    // The new account is the one shown.
+    QCOMPARE(dialog.txtUsername()->text(), name);
+
+    const std::optional<LoginState> login =
+        LoginService::checkCredentials(m_workspace->context().mainDatabase(), name, password);
+    QVERIFY(login);
+    QCOMPARE(login->currentUser, name);
+    QCOMPARE(login->currentUserFields, u"1,13"_s);
+}
+
+void TestUserAccountsDialog::noTicksIsStoredAsHash()
+{
+    UserAccountsDialog dialog(m_workspace->context());
+    dialog.accounts().selectUser(rowOfUser(dialog, u"Bob"_s));
+    dialog.button(u"butEdit"_s)->click();
+    dialog.button(u"butNone"_s)->click();
+    dialog.button(u"butSaveChanges"_s)->click();
+    QCOMPARE(stored(u"Bob"_s)->fields, u"#"_s);
+
+    UserAccountsDialog again(m_workspace->context());
+    again.accounts().selectUser(rowOfUser(again, u"Bob"_s));
+    QCOMPARE(again.txtUsername()->text(), u"Bob"_s);
+    QCOMPARE(ticked(again), QStringList());
+}
+
+void TestUserAccountsDialog::editingMayTakeAnotherAccountsName()
+{
+    UserAccountsDialog dialog(m_workspace->context());
+    dialog.accounts().selectUser(rowOfUser(dialog, u"Anna"_s));
+    dialog.button(u"butEdit"_s)->click();
+    QCOMPARE(dialog.accounts().mode(), UserAccounts::Mode::Editing);
+    type(dialog.txtUsername(), u"Bob"_s);
+    dialog.button(u"butSaveChanges"_s)->click();
+    QVERIFY(m_workspace->prompter().messages().isEmpty());
+    QSqlQuery query(u"SELECT COUNT(*), MIN(Password), MAX(DateCreated) FROM Users WHERE "
+                    u"UserName = 'Bob'"_s,
+                    m_workspace->context().mainDatabase().database());
+    QVERIFY(query.next());
+    QCOMPARE(query.value(0).toInt(), 2);
+    // Saving an edit stamps the account with the moment of the save.
+    QCOMPARE(query.value(2).toString(), u"6 Dec 2026 2:05 PM"_s);
+}
+
+void TestUserAccountsDialog::deleteWhileEditingThenSave()
+{
+    UserAccountsDialog dialog(m_workspace->context());
+    dialog.accounts().selectUser(rowOfUser(dialog, u"Bob"_s));
+    dialog.button(u"butEdit"_s)->click();
+    QVERIFY(dialog.button(u"butDelete"_s)->isEnabled());
+    m_workspace->prompter().scriptAnswer(Prompter::Answer::Yes);
+    dialog.button(u"butDelete"_s)->click();
+    QVERIFY(lastMessage().startsWith(u"Are you sure you want to delete the record with ID "_s));
+    QVERIFY(!stored(u"Bob"_s));
+
+    dialog.button(u"butSaveChanges"_s)->click();
+    QCOMPARE(lastMessage(), u"This user account doesn't exist. It may have been deleted!\r\n\r\n"
+                            u"Changes to the user have not been saved!"_s);
+    QVERIFY(!stored(u"Bob"_s)); // not brought back
+    QCOMPARE(userCount(), 1);
+    // Nothing is left to edit: closing does not ask about it.
+    QVERIFY(!dialog.txtUsername()->isEnabled());
+    const qsizetype before = m_workspace->prompter().messages().size();
+    dialog.button(u"butClose"_s)->click();
+    QCOMPARE(m_workspace->prompter().messages().size(), before);
+}
+
+void TestUserAccountsDialog::cancelShowsTheStoredValues()
+{
+    UserAccountsDialog dialog(m_workspace->context());
+    dialog.button(u"butEdit"_s)->click();
+    type(dialog.txtUsername(), u"Changed"_s);
+    dialog.button(u"butAll"_s)->click();
+    dialog.button(u"butCancelChanges"_s)->click();
+    QCOMPARE(dialog.txtUsername()->text(), u"Anna"_s);
+    QCOMPARE(ticked(dialog), (QStringList{u"1"_s, u"2"_s}));
+    QCOMPARE(stored(u"Anna"_s)->fields, u"1,999,#2"_s);
+}
+
+void TestUserAccountsDialog::allAndNoneLeaveHeadings()
+{
+    UserAccountsDialog dialog(m_workspace->context());
+    dialog.button(u"butEdit"_s)->click();
+    dialog.button(u"butAll"_s)->click();
+    const GridModel &fields = dialog.accounts().fields();
+    int headings = 0;
+    for (int row = 1; row <= fields.rowCount(); ++row) {
+        const bool heading = fields.cell(row, 2).back == QColor(0xDD, 0x68, 0x00);
+        headings += heading ? 1 : 0;
+        QCOMPARE(fields.cell(row, 2).icon,
+                 heading ? int(UserAccounts::NoIcon) : int(UserAccounts::Ticked));
+    }
+    QVERIFY(headings > 3);
+    QCOMPARE(ticked(dialog).size(), fields.rowCount() - headings);
+    dialog.button(u"butNone"_s)->click();
+    QCOMPARE(ticked(dialog), QStringList());
+}
+
+void TestUserAccountsDialog::headerClicksSort()
+{
+    addUser(u"carl"_s, u"c"_s, 0, u"#"_s);
+    UserAccountsDialog dialog(m_workspace->context());
+    dialog.show();
+    const GridModel &users = dialog.accounts().users();
+    const auto names = [&] {
+        QStringList list;
+        for (int row = 1; row <= users.rowCount(); ++row)
+            list << users.cellText(row, 2);
+        return list;
+    };
+    QCOMPARE(names(), (QStringList{u"Anna"_s, u"Bob"_s, u"carl"_s}));
+    QHeaderView *header = dialog.lstUsers()->horizontalHeader();
+    const QPoint username(header->sectionViewportPosition(1) + 5, header->height() / 2);
+    QTest::mouseClick(header->viewport(), Qt::LeftButton, {}, username);
+    QCOMPARE(names(), (QStringList{u"carl"_s, u"Bob"_s, u"Anna"_s}));
+    QTest::mouseClick(header->viewport(), Qt::LeftButton, {}, username);
+    QCOMPARE(names(), (QStringList{u"Anna"_s, u"Bob"_s, u"carl"_s}));
+    // Another column starts ascending.
+    dialog.accounts().headerClicked(4);
+    QCOMPARE(dialog.accounts().sortColumn(), 4);
+    QVERIFY(dialog.accounts().sortAscending());
+}
+
+void TestUserAccountsDialog::closingWhileEditingAsks_data()
+{
+    QTest::addColumn<int>("answer");
+    QTest::addColumn<bool>("closes");
+    QTest::addColumn<QString>("storedName");
+    QTest::newRow("cancel") << int(Prompter::Answer::Cancel) << false << u"Anna"_s;
+    QTest::newRow("no") << int(Prompter::Answer::No) << true << u"Anna"_s;
+    QTest::newRow("yes") << int(Prompter::Answer::Yes) << true << u"Annie"_s;
+}
+
+void TestUserAccountsDialog::closingWhileEditingAsks()
+{
+    QFETCH(int, answer);
+    QFETCH(bool, closes);
+    QFETCH(QString, storedName);
+    UserAccountsDialog dialog(m_workspace->context());
+    dialog.show();
+    dialog.button(u"butEdit"_s)->click();
+    type(dialog.txtUsername(), u"Annie"_s);
+    m_workspace->prompter().scriptAnswer(Prompter::Answer(answer));
+    dialog.button(u"butClose"_s)->click();
+    const auto &question = m_workspace->prompter().messages().first();
+    QCOMPARE(question.text, u"Would you like to save changes to the user before closing?"_s);
+    QCOMPARE(question.title, u"Save Changes"_s);
+    QCOMPARE(question.buttons, Prompter::Buttons::YesNoCancel);
+    QCOMPARE(dialog.isVisible(), !closes);
+    QVERIFY(stored(storedName));
+}
+
+QTEST_MAIN(TestUserAccountsDialog)
+#include "tst_useraccountsdialog.moc"
