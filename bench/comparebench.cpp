@@ -3,19 +3,13 @@
 // loaded and the first tab shows (the window waits 100 ms before it starts loading, so that
 // it can paint itself first). Target: under one second.
 
-#include "app/appcontext.h"
-#include "app/demoworkspace.h"
-#include "app/recordingprompter.h"
-#include "app/settingsloader.h"
-#include "app/settingsstore.h"
-#include "database/mainconnector.h"
-#include "engine/producecommand.h"
+#include "demosession.h"
+
 #include "views/comparewindow.h"
 
 #include <QApplication>
 #include <QElapsedTimer>
 #include <QEventLoop>
-#include <QTemporaryDir>
 #include <QTextStream>
 
 #include <algorithm>
@@ -28,20 +22,10 @@ int main(int argc, char *argv[])
     QApplication app(argc, argv);
     const int rounds = argc > 1 ? QString::fromLocal8Bit(argv[1]).toInt() : 10;
 
-    QTemporaryDir root;
-    if (DemoWorkspace::create(root.filePath(u"demo"_s), QStringLiteral(VELTRIX_NEW_DB))) {
-        QTextStream(stderr) << "cannot write the demo workspace" << Qt::endl;
+    DemoSession demo;
+    if (!demo.open())
         return 1;
-    }
-    RecordingPrompter prompter;
-    AppContext context(std::make_unique<SettingsStore>(root.filePath(u"demo/settings.ini"_s)),
-                       prompter, AppLocations::inFolder(root.filePath(u"app"_s)));
-    if (!loadSettings(context).isEmpty() || !connectMainDatabase(context).isEmpty()) {
-        QTextStream(stderr) << "start-up failed" << Qt::endl;
-        return 1;
-    }
-    context.loginState() = LoginState{true, u"sysop"_s, 1, QString()};
-    ProduceCommand(context).produce({7, 2025, 6, 2026});
+    AppContext &context = demo.context();
 
     QList<double> timings;
     for (int round = 0; round < rounds; ++round) {

@@ -2,19 +2,13 @@
 // Filling and evaluating the "All" tab: every Field of the catalogue (123 rows) from a period
 // loaded from the demo shop. Target: under 5 ms.
 
-#include "app/appcontext.h"
-#include "app/demoworkspace.h"
-#include "app/recordingprompter.h"
-#include "app/settingsloader.h"
-#include "app/settingsstore.h"
-#include "database/mainconnector.h"
-#include "engine/producecommand.h"
+#include "demosession.h"
+
 #include "views/gridmodel.h"
 #include "views/tabviewbuilder.h"
 
 #include <QCoreApplication>
 #include <QElapsedTimer>
-#include <QTemporaryDir>
 #include <QTextStream>
 
 #include <algorithm>
@@ -27,20 +21,10 @@ int main(int argc, char *argv[])
     const int rounds = argc > 1 ? QString::fromLocal8Bit(argv[1]).toInt() : 200;
     QTextStream out(stdout);
 
-    QTemporaryDir root;
-    if (DemoWorkspace::create(root.filePath(u"demo"_s), QStringLiteral(VELTRIX_NEW_DB))) {
-        QTextStream(stderr) << "cannot write the demo workspace" << Qt::endl;
+    DemoSession demo;
+    if (!demo.open())
         return 1;
-    }
-    RecordingPrompter prompter;
-    AppContext context(std::make_unique<SettingsStore>(root.filePath(u"demo/settings.ini"_s)),
-                       prompter, AppLocations::inFolder(root.filePath(u"app"_s)));
-    if (!loadSettings(context).isEmpty() || !connectMainDatabase(context).isEmpty()) {
-        QTextStream(stderr) << "start-up failed" << Qt::endl;
-        return 1;
-    }
-    context.loginState() = LoginState{true, u"sysop"_s, 1, QString()};
-    ProduceCommand(context).produce({7, 2025, 6, 2026});
+    AppContext &context = demo.context();
 
     GridModel grid;
     TabViewBuilder::addMainColumns(grid);

@@ -29,13 +29,23 @@ QStringList TabViewBuilder::tabCaptions()
             u"Pai&nt"_s, u"&Repair Orders"_s, u"&Financial"_s};
 }
 
-void TabViewBuilder::addMainColumns(GridModel &grid)
+namespace {
+
+// The Field's ID, type and data (hidden), its number and its label: every KPI grid starts so.
+void addFieldColumns(GridModel &grid)
 {
     grid.addColumn(u"id"_s, QString(), GridModel::AlignLeft, 0, true);
     grid.addColumn(u"type"_s, QString(), GridModel::AlignLeft, 80, false);
     grid.addColumn(u"data"_s, QString(), GridModel::AlignLeft, 80, false);
     grid.addColumn(u"row"_s, u"Row"_s, GridModel::AlignLeft, 45, true);
     grid.addColumn(u"label"_s, u"Field"_s, GridModel::AlignLeft, 250, true);
+}
+
+} // namespace
+
+void TabViewBuilder::addMainColumns(GridModel &grid)
+{
+    addFieldColumns(grid);
     grid.addColumn(u"value"_s, u"Value"_s, GridModel::AlignCentre, 100, true);
     grid.addColumn(u"benchmark"_s, u"Optimal %"_s, GridModel::AlignCentre, 80, true);
     grid.addColumn(u"variant"_s, u"Variant"_s, GridModel::AlignCentre, 80, true);
@@ -44,11 +54,7 @@ void TabViewBuilder::addMainColumns(GridModel &grid)
 
 void TabViewBuilder::addCompareColumns(GridModel &grid)
 {
-    grid.addColumn(u"id"_s, QString(), GridModel::AlignLeft, 0, true);
-    grid.addColumn(u"type"_s, QString(), GridModel::AlignLeft, 80, false);
-    grid.addColumn(u"data"_s, QString(), GridModel::AlignLeft, 80, false);
-    grid.addColumn(u"row"_s, u"Row"_s, GridModel::AlignLeft, 45, true);
-    grid.addColumn(u"label"_s, u"Field"_s, GridModel::AlignLeft, 250, true);
+    addFieldColumns(grid);
     for (int slot = PeriodDataSet::SlotCount - 1; slot >= 1; --slot) {
         grid.addColumn(u"value"_s + QString::number(slot), u"Value "_s + QString::number(slot + 1),
                        GridModel::AlignCentre, 110, false);

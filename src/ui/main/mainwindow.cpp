@@ -11,6 +11,7 @@
 #include "views/comparewindow.h"
 #include "views/grapharea.h"
 #include "views/kpitabview.h"
+#include "views/tabbuttons.h"
 
 #include "app/appcontext.h"
 #include "app/errorreporter.h"
@@ -237,16 +238,9 @@ QWidget *MainWindow::buildKpiPanel()
     dates->addWidget(m_lstCompareType);
 
     auto *tabs = new QHBoxLayout;
-    const QStringList captions = TabViewBuilder::tabCaptions();
-    for (int tab = 0; tab < captions.size(); ++tab) {
-        auto *button = new QPushButton(captions[tab], m_kpiPanel);
-        button->setCheckable(true);
-        button->setAutoExclusive(true);
-        connect(button, &QPushButton::clicked, this, [this, tab] { selectTab(tab); });
-        m_butTab << button;
-        tabs->addWidget(button);
-    }
-    tabs->addStretch();
+    m_tabButtons = new TabButtons(m_kpiPanel);
+    connect(m_tabButtons, &TabButtons::tabClicked, this, &MainWindow::selectTab);
+    tabs->addWidget(m_tabButtons, 1);
 
     // The colour legend: what the cells' colours say.
     auto *legend = new QWidget(m_kpiPanel);
@@ -354,7 +348,7 @@ void MainWindow::logoff(bool reset)
 void MainWindow::selectTab(int tab)
 {
     m_currentTab = tab;
-    m_butTab.at(tab)->setChecked(true);
+    m_tabButtons->setCurrent(tab);
     m_tabView->showTab(tab);
 }
 

@@ -20,6 +20,7 @@ class QLineEdit;
 class QPushButton;
 class QStackedWidget;
 class QTimer;
+class TabButtons;
 
 // frmMain: the login panel, then the KPI views with the choice of months, the Produce
 // command, the tabs, the graph and the grid, with the menus and a status bar.
@@ -101,7 +102,7 @@ private:
     QCheckBox *m_chkCompare = nullptr;
     QComboBox *m_lstCompareCount = nullptr;
     QComboBox *m_lstCompareType = nullptr;
-    QList<QPushButton *> m_butTab;
+    TabButtons *m_tabButtons = nullptr;
     KpiTabView *m_tabView = nullptr;
     QLabel *m_lblLoggedIn = nullptr;
     QLabel *m_lblActiveUsers = nullptr;

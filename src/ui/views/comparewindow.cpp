@@ -5,6 +5,7 @@
 #include "grapharea.h"
 #include "gridview.h"
 #include "kpitabview.h"
+#include "tabbuttons.h"
 
 #include "app/appcontext.h"
 #include "app/numberformat.h"
@@ -42,6 +43,7 @@ CompareWindow::CompareWindow(AppContext &context, ComparisonRanges::Kind kind, i
     , m_count(std::clamp(count, 1, PeriodDataSet::SlotCount - 1))
     , m_tmrStart(new QTimer(this))
     , m_tabView(new KpiTabView(context, this, m_count))
+    , m_tabButtons(new TabButtons(this))
     , m_picLoad(new QWidget(this))
     , m_lblLoad(new QLabel(m_picLoad))
     , m_picProgress(new QWidget(m_picLoad))
@@ -54,21 +56,10 @@ CompareWindow::CompareWindow(AppContext &context, ComparisonRanges::Kind kind, i
     menu->addAction(u"&Print"_s, this, &CompareWindow::print);
     menu->addAction(u"&Close"_s, this, &QDialog::accept);
 
-    auto *tabs = new QHBoxLayout;
-    const QStringList captions = TabViewBuilder::tabCaptions();
-    for (int tab = 0; tab < captions.size(); ++tab) {
-        auto *button = new QPushButton(captions[tab], this);
-        button->setCheckable(true);
-        button->setAutoExclusive(true);
-        button->setAutoDefault(false);
-        connect(button, &QPushButton::clicked, this, [this, tab] { selectTab(tab); });
-        m_butTab << button;
-        tabs->addWidget(button);
-    }
-    tabs->addStretch();
+    connect(m_tabButtons, &TabButtons::tabClicked, this, &CompareWindow::selectTab);
     auto *layout = new QVBoxLayout(this);
     layout->setMenuBar(menu);
-    layout->addLayout(tabs);
+    layout->addWidget(m_tabButtons);
     layout->addWidget(m_tabView, 1);
 
     m_picLoad->setObjectName(u"picLoad"_s);
@@ -149,10 +140,15 @@ void CompareWindow::loadPeriods()
     Q_EMIT loaded();
 }
 
+QPushButton *CompareWindow::tabButton(int tab) const
+{
+    return m_tabButtons->button(tab);
+}
+
 void CompareWindow::selectTab(int tab)
 {
     m_currentTab = tab;
-    m_butTab.at(tab)->setChecked(true);
+    m_tabButtons->setCurrent(tab);
     m_tabView->showTab(tab);
 }
 

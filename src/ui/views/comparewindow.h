@@ -11,6 +11,7 @@ class KpiTabView;
 class QLabel;
 class QPushButton;
 class QTimer;
+class TabButtons;
 
 // frmCompare: the produced range beside the same range in up to four earlier years or earlier
 // periods of equal length. It loads the earlier ranges into slots 1 to N while a progress bar
@@ -39,7 +40,7 @@ public:
     QWidget *picLoad() const { return m_picLoad; }
     QLabel *lblLoad() const { return m_lblLoad; }
     QWidget *shpProgress() const { return m_shpProgress; }
-    QPushButton *tabButton(int tab) const { return m_butTab.at(tab); }
+    QPushButton *tabButton(int tab) const;
 
     static constexpr int MinimumHeightTwips = 7875;
 
@@ -67,7 +68,7 @@ private:
 
     QTimer *m_tmrStart;
     KpiTabView *m_tabView;
-    QList<QPushButton *> m_butTab;
+    TabButtons *m_tabButtons;
     QWidget *m_picLoad;
     QLabel *m_lblLoad;
     QWidget *m_picProgress;

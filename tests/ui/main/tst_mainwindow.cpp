@@ -66,6 +66,14 @@ private:
         auto window = std::make_unique<MainWindow>(workspace.context(), workspace.prompter());
         return window;
     }
+    // The main window over a demo workspace written to the folder.
+    std::unique_ptr<MainWindow> openOnDemo(const QString &folder)
+    {
+        if (DemoWorkspace::create(folder, QStringLiteral(VELTRIX_NEW_DB)))
+            return nullptr;
+        DemoWorkspace::configure(m_workspace->store(), folder);
+        return openWindow(*m_workspace);
+    }
     void addUser(TestWorkspace &workspace, const QString &name)
     {
         QSqlQuery query(workspace.context().mainDatabase().database());
@@ -280,10 +288,7 @@ void TestMainWindow::shutdownRequestClosesTheWindow()
 void TestMainWindow::produceShowsTheDemoFigures()
 {
     QTemporaryDir dir;
-    QCOMPARE(DemoWorkspace::create(dir.filePath(u"demo"_s), QStringLiteral(VELTRIX_NEW_DB)),
-             std::nullopt);
-    DemoWorkspace::configure(m_workspace->store(), dir.filePath(u"demo"_s));
-    auto window = openWindow(*m_workspace);
+    auto window = openOnDemo(dir.filePath(u"demo"_s));
     QVERIFY(window);
     window->login(u"manager"_s, u"manager1"_s);
     window->lstMonth1()->setCurrentIndex(6);
@@ -317,10 +322,7 @@ void TestMainWindow::setupMenuFollowsTheUser()
     QFETCH(bool, menu);
     QFETCH(bool, mapping);
     QTemporaryDir dir;
-    QCOMPARE(DemoWorkspace::create(dir.filePath(u"demo"_s), QStringLiteral(VELTRIX_NEW_DB)),
-             std::nullopt);
-    DemoWorkspace::configure(m_workspace->store(), dir.filePath(u"demo"_s));
-    auto window = openWindow(*m_workspace);
+    auto window = openOnDemo(dir.filePath(u"demo"_s));
     QVERIFY(window);
     window->login(user, password);
     QCOMPARE(window->menuSetup()->isEnabled(), menu);
@@ -380,9 +382,7 @@ void TestMainWindow::mappingAndRatesReachTheNextProduce()
 {
     QTemporaryDir dir;
     const QString demo = dir.filePath(u"demo"_s);
-    QCOMPARE(DemoWorkspace::create(demo, QStringLiteral(VELTRIX_NEW_DB)), std::nullopt);
-    DemoWorkspace::configure(m_workspace->store(), demo);
-    auto window = openWindow(*m_workspace);
+    auto window = openOnDemo(demo);
     QVERIFY(window);
     window->login(u"sysop"_s, u"sysop"_s);
     window->produce();
