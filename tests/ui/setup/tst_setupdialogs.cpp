@@ -96,6 +96,7 @@ private Q_SLOTS:
     void escapeThenOkKeepsTheValue();
     void hiddenFieldIsListedButNotSaved();
     void fieldDeletedMeanwhileIsSkipped();
+    void fieldChangedMeanwhileIsReported();
 
 private:
     // Starts up on the workspace; the note about a new database file is not what is tested.
@@ -380,6 +381,28 @@ void TestSetupDialogs::fieldDeletedMeanwhileIsSkipped()
     QVERIFY(!dialog.isVisible());
     QVERIFY(m_workspace->prompter().messages().isEmpty());
     QCOMPARE(stored(u"SELECT Data FROM Fields WHERE ID = 14"_s).toString(), u"5-1101"_s);
+}
+
+void TestSetupDialogs::fieldChangedMeanwhileIsReported()
+{
+    QVERIFY(connect());
+    ProgramSetupDialog dialog(m_workspace->context());
+    dialog.show();
+    const GridModel &grid = dialog.setup().grid(ProgramSetup::Mapping);
+    const int first = rowOf(grid, 1, u"13"_s);
+    const int second = rowOf(grid, 1, u"14"_s);
+    clickCell(dialog.lstA(), first, 4);
+    typeInto(dialog.txtEdit(), u"4-1101"_s, Qt::Key_Return);
+    clickCell(dialog.lstA(), second, 4);
+    typeInto(dialog.txtEdit(), u"5-1101"_s, Qt::Key_Return);
+    QVERIFY(OtherCopy(m_workspace->mainDatabase())
+                .exec(u"UPDATE Fields SET Data = '5-1199' WHERE ID = 14"_s));
+    dialog.butOK()->click();
+    QVERIFY(dialog.isVisible());
+    QCOMPARE(m_workspace->prompter().messages().size(), 1);
+    QVERIFY(m_workspace->prompter().messages().first().title.contains(u"Save Program Setup"_s));
+    QCOMPARE(stored(u"SELECT Data FROM Fields WHERE ID = 13"_s).toString(), u"4-1101"_s);
+    QCOMPARE(stored(u"SELECT Data FROM Fields WHERE ID = 14"_s).toString(), u"5-1199"_s);
 }
 
 QTEST_MAIN(TestSetupDialogs)
