@@ -1,5 +1,4 @@
 // Veltrix — KPI dashboard for small businesses.
-#include "app/settingsstore.h"
 #include "report/pagesetup.h"
 #include "report/reportrenderer.h"
 
@@ -75,10 +74,6 @@ class TestReportPrint : public QObject
 
 private Q_SLOTS:
     void initTestCase();
-    void sessionReplacesAndRestores_data();
-    void sessionReplacesAndRestores();
-    void pageOptions_data();
-    void pageOptions();
     void expandCodes_data();
     void expandCodes();
     void unitlessFontSizesBecomePixels();
@@ -95,86 +90,6 @@ void TestReportPrint::initTestCase()
     if (tool(u"pdftotext"_s).isEmpty() || tool(u"pdftoppm"_s).isEmpty())
         QFAIL("pdftotext and pdftoppm (poppler-utils) are needed; scripts/install-deps installs "
               "them");
-}
-
-void TestReportPrint::sessionReplacesAndRestores_data()
-{
-    QTest::addColumn<bool>("hadValues");
-    QTest::addColumn<bool>("printed");
-    QTest::newRow("user values, printed") << true << true;
-    QTest::newRow("user values, never printed") << true << false;
-    QTest::newRow("no values, printed") << false << true;
-}
-
-void TestReportPrint::sessionReplacesAndRestores()
-{
-    QFETCH(bool, hadValues);
-    QFETCH(bool, printed);
-    QTemporaryDir folder;
-    SettingsStore store(folder.filePath(u"settings.ini"_s));
-    const QString key = PageSetupSession::Key;
-    if (hadValues) {
-        store.writeSetting(u"margin_top"_s, u"0.75"_s, key);
-        store.writeSetting(u"margin_left"_s, u"0.3"_s, key);
-        store.writeSetting(u"header"_s, u"&w&bPage &p of &P"_s, key);
-        store.writeSetting(u"Print_Background"_s, u"yes"_s, key);
-    }
-    QStringList before;
-    for (const QString &name : PageSetupSession::valueNames())
-        before << store.readSetting(name, key);
-    {
-        PageSetupSession session(store);
-        QCOMPARE(store.readSetting(u"margin_top"_s, key), u"0.5"_s);
-        QCOMPARE(store.readSetting(u"margin_left"_s, key), u"0.4"_s);
-        QCOMPARE(store.readSetting(u"margin_right"_s, key), u"0.4"_s);
-        QCOMPARE(store.readSetting(u"Shrink_To_Fit"_s, key), u"yes"_s);
-        if (printed)
-            session.applyPageOptions(false, true, true, u"1/07/2025 to 30/06/2026"_s);
-        const PrintOptions options = PrintOptions::fromStore(store);
-        QCOMPARE(options.marginTopInches, 0.5);
-        QCOMPARE(options.marginLeftInches, 0.4);
-        QVERIFY(options.shrinkToFit);
-    }
-    QStringList after;
-    for (const QString &name : PageSetupSession::valueNames())
-        after << store.readSetting(name, key);
-    QCOMPARE(after, before);
-    QVERIFY(store.readSetting(u"header"_s, key, u"absent"_s) != u"absent"_s || !hadValues);
-}
-
-void TestReportPrint::pageOptions_data()
-{
-    QTest::addColumn<bool>("formatting");
-    QTest::addColumn<bool>("date");
-    QTest::addColumn<bool>("pages");
-    QTest::addColumn<QString>("background");
-    QTest::addColumn<QString>("header");
-    QTest::addColumn<QString>("footer");
-    QTest::newRow("all on") << true << true << true << u"yes"_s << u"Title&b&d"_s
-                            << u"&bPage &p of &P"_s;
-    QTest::newRow("all off") << false << false << false << u"no"_s << u"Title"_s << QString();
-    QTest::newRow("date only") << false << true << false << u"no"_s << u"Title&b&d"_s << QString();
-}
-
-void TestReportPrint::pageOptions()
-{
-    QFETCH(bool, formatting);
-    QFETCH(bool, date);
-    QFETCH(bool, pages);
-    QFETCH(QString, background);
-    QFETCH(QString, header);
-    QFETCH(QString, footer);
-    QTemporaryDir folder;
-    SettingsStore store(folder.filePath(u"settings.ini"_s));
-    PageSetupSession session(store);
-    session.applyPageOptions(formatting, date, pages, u"Title"_s);
-    const QString key = PageSetupSession::Key;
-    QCOMPARE(store.readSetting(u"Print_Background"_s, key), background);
-    QCOMPARE(store.readSetting(u"header"_s, key), header);
-    QCOMPARE(store.readSetting(u"footer"_s, key), footer);
-    const PrintOptions options = PrintOptions::fromStore(store);
-    QCOMPARE(options.printBackground, formatting);
-    QCOMPARE(options.header, header);
 }
 
 void TestReportPrint::expandCodes_data()

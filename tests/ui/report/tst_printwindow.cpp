@@ -41,7 +41,6 @@ private Q_SLOTS:
     void commandsApplyTheBoxes();
     void printWritesThePages();
     void closingRestoresTheUsersValues();
-    void placementIsKept();
 
 private:
     QString writePage()
@@ -177,18 +176,6 @@ void TestPrintWindow::closingRestoresTheUsersValues()
     QCOMPARE(store.readSetting(u"margin_top"_s, PageSetupSession::Key), u"0.75"_s);
     QCOMPARE(store.readSetting(u"footer"_s, PageSetupSession::Key), u"&u&b&d"_s);
     QCOMPARE(store.readSetting(u"header"_s, PageSetupSession::Key, u"<absent>"_s), u"<absent>"_s);
-}
-
-void TestPrintWindow::placementIsKept()
-{
-    {
-        PrintWindow window(m_workspace->context(), nullptr);
-        window.show();
-        window.setGeometry(30, 40, 700, 500);
-        window.accept();
-    }
-    PrintWindow again(m_workspace->context(), nullptr);
-    QCOMPARE(again.size(), QSize(700, 500));
 }
 
 QTEST_MAIN(TestPrintWindow)

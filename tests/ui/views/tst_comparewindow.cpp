@@ -55,7 +55,6 @@ private Q_SLOTS:
     void printFromTheGraphTab();
     void printFromAnotherTabHasNoPicture();
     void mainWindowOpensTheComparison();
-    void placementIsSavedAndRestored();
 
 private:
     void produce(int firstMonth, int firstYear, int lastMonth, int lastYear)
@@ -314,22 +313,6 @@ void TestCompareWindow::mainWindowOpensTheComparison()
     main.itemPrint()->trigger();
     QCOMPARE(header, u"1/7/25 to 30/6/26"_s);
     main.logoff(true);
-}
-
-void TestCompareWindow::placementIsSavedAndRestored()
-{
-    produce(7, 2025, 6, 2026);
-    {
-        CompareWindow window(m_workspace->context(), ComparisonRanges::Kind::Years, 1);
-        window.show();
-        QVERIFY(waitUntilLoaded(window));
-        window.setGeometry(40, 50, 1040, 730);
-        window.accept();
-    }
-    CompareWindow again(m_workspace->context(), ComparisonRanges::Kind::Years, 1);
-    QCOMPARE(again.size(), QSize(1040, 730));
-    QVERIFY(waitUntilLoaded(again));
-    again.reject();
 }
 
 QTEST_MAIN(TestCompareWindow)
