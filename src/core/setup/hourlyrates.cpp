@@ -15,11 +15,6 @@ HourlyRates::HourlyRates(AppContext &context)
     , m_list(m_grid, {RateColumn, 0})
 {}
 
-int HourlyRates::departmentWidth(int gridWidth, int scrollBarHeight)
-{
-    return std::max(16, gridWidth - RateWidth - scrollBarHeight - 4);
-}
-
 void HourlyRates::load()
 {
     m_grid.addColumn(u"id"_s, QString(), GridModel::AlignLeft, 0, true);

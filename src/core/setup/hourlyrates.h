@@ -26,9 +26,6 @@ public:
     // Writes every rate; false when a failure stopped it (reported under "Save Labour Hours").
     bool save();
 
-    // The department column takes what the rate leaves of the grid's width.
-    static int departmentWidth(int gridWidth, int scrollBarHeight);
-
 private:
     AppContext &m_context;
     GridModel m_grid;

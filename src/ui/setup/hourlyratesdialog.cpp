@@ -14,7 +14,6 @@ using namespace Qt::StringLiterals;
 
 HourlyRatesDialog::HourlyRatesDialog(AppContext &context, QWidget *owner)
     : QDialog(owner)
-    , m_context(context)
     , m_rates(context)
     , m_lstRates(new GridView(m_rates.grid(), this))
     , m_txtEdit(new CellEditor(this))
@@ -25,6 +24,7 @@ HourlyRatesDialog::HourlyRatesDialog(AppContext &context, QWidget *owner)
     setWindowTitle(u"Hourly Rates"_s);
     m_lstRates->setObjectName(u"lstRates"_s);
     m_lstRates->setCellEditing(true);
+    m_lstRates->setFittedColumn(2); // the department
     m_butOK->setObjectName(u"butOK"_s);
     m_butCancel->setObjectName(u"butCancel"_s);
     // Enter belongs to the edit box, not to a default button.
@@ -64,12 +64,4 @@ void HourlyRatesDialog::accept()
     m_txtEdit->commit();
     if (m_rates.save())
         QDialog::accept();
-}
-
-void HourlyRatesDialog::resizeEvent(QResizeEvent *event)
-{
-    QDialog::resizeEvent(event);
-    GridModel &grid = m_rates.grid();
-    grid.setColumnWidth(2, HourlyRates::departmentWidth(m_lstRates->viewport()->width(),
-                                                        m_context.settings().scrollBarHeight));
 }

@@ -29,11 +29,7 @@ public:
     // OK: writes the rates and closes; a failed save keeps the window open.
     void accept() override;
 
-protected:
-    void resizeEvent(QResizeEvent *event) override;
-
 private:
-    AppContext &m_context;
     HourlyRates m_rates;
     GridView *m_lstRates;
     CellEditor *m_txtEdit;

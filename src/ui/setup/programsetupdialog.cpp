@@ -4,7 +4,6 @@
 #include "celleditor.h"
 
 #include "app/appcontext.h"
-#include "views/gridoperations.h"
 #include "views/gridview.h"
 
 #include <QGridLayout>
@@ -17,7 +16,6 @@ using namespace Qt::StringLiterals;
 
 ProgramSetupDialog::ProgramSetupDialog(AppContext &context, QWidget *owner)
     : QDialog(owner)
-    , m_context(context)
     , m_setup(context)
     , m_lists{new GridView(m_setup.grid(ProgramSetup::Mapping), this),
               new GridView(m_setup.grid(ProgramSetup::Benchmarks), this)}
@@ -51,6 +49,7 @@ ProgramSetupDialog::ProgramSetupDialog(AppContext &context, QWidget *owner)
     m_setup.load();
     for (GridView *view : m_lists) {
         view->setCellEditing(true);
+        view->setFittedColumn(ProgramSetup::LabelColumn);
         view->applyLayout();
         connect(view, &GridView::editRequested, this, [this, view](int row, int, QChar key) {
             // Headings are not edited.
@@ -83,15 +82,4 @@ void ProgramSetupDialog::accept()
     m_txtEdit->commit();
     if (m_setup.save())
         QDialog::accept();
-}
-
-void ProgramSetupDialog::resizeEvent(QResizeEvent *event)
-{
-    QDialog::resizeEvent(event);
-    for (GridView *view : m_lists) {
-        GridModel &grid = view->grid();
-        const int width = GridOperations::fitColumn(grid, ProgramSetup::LabelColumn,
-                                                    view->viewport()->width(), 0, false);
-        grid.setColumnWidth(ProgramSetup::LabelColumn, width);
-    }
 }

@@ -31,13 +31,9 @@ public:
     // OK: writes both lists and closes; a failed save keeps the window open.
     void accept() override;
 
-protected:
-    void resizeEvent(QResizeEvent *event) override;
-
 private:
     ProgramSetup::List listOf(const GridView *view) const;
 
-    AppContext &m_context;
     ProgramSetup m_setup;
     GridView *m_lists[2];
     CellEditor *m_txtEdit;

@@ -38,7 +38,6 @@ QIcon tickIcon(bool ticked)
 
 UserAccountsDialog::UserAccountsDialog(AppContext &context, QWidget *owner)
     : QDialog(owner)
-    , m_context(context)
     , m_accounts(context)
     , m_lstUsers(new GridView(m_accounts.users(), this))
     , m_lstFields(new GridView(m_accounts.fields(), this))
@@ -51,6 +50,7 @@ UserAccountsDialog::UserAccountsDialog(AppContext &context, QWidget *owner)
     m_lstUsers->setObjectName(u"lstUsers"_s);
     m_lstFields->setObjectName(u"lstFields"_s);
     m_lstFields->setIcons({tickIcon(false), tickIcon(true)});
+    m_lstFields->setFittedColumn(2);
     m_txtUsername->setObjectName(u"txtUsername"_s);
     m_txtUsername->setMaxLength(UserAccounts::MaxUserNameLength);
     m_txtPassword->setObjectName(u"txtPassword"_s);
@@ -176,12 +176,4 @@ void UserAccountsDialog::done(int result)
     if (!m_accounts.mayClose())
         return;
     QDialog::done(result);
-}
-
-void UserAccountsDialog::resizeEvent(QResizeEvent *event)
-{
-    QDialog::resizeEvent(event);
-    GridModel &fields = m_accounts.fields();
-    fields.setColumnWidth(2, std::max(16, m_lstFields->viewport()->width() -
-                                              m_context.settings().scrollBarHeight - 4));
 }

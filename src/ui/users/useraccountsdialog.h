@@ -32,14 +32,10 @@ public:
 
     void done(int result) override;
 
-protected:
-    void resizeEvent(QResizeEvent *event) override;
-
 private:
     void showState();
     void takeEntry();
 
-    AppContext &m_context;
     UserAccounts m_accounts;
     GridView *m_lstUsers;
     GridView *m_lstFields;

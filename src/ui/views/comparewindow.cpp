@@ -13,7 +13,6 @@
 #include "app/widgetplacement.h"
 #include "engine/rangeloader.h"
 #include "report/gridreport.h"
-#include "views/gridoperations.h"
 #include "views/tabviewbuilder.h"
 
 #include <QApplication>
@@ -57,6 +56,8 @@ CompareWindow::CompareWindow(AppContext &context, ComparisonRanges::Kind kind, i
     menu->addAction(u"&Close"_s, this, &QDialog::accept);
 
     connect(m_tabButtons, &TabButtons::tabClicked, this, &CompareWindow::selectTab);
+    // The Field's name takes the width the period columns leave.
+    m_tabView->lstGrid()->setFittedColumn(m_tabView->grid().columnIndex(u"label"_s));
     auto *layout = new QVBoxLayout(this);
     layout->setMenuBar(menu);
     layout->addWidget(m_tabButtons);
@@ -133,7 +134,6 @@ void CompareWindow::loadPeriods()
             return;
     }
     data.setCurrentSlot(0);
-    fitLabelColumn();
     selectTab(m_currentTab);
     m_picLoad->hide();
     m_loading = false;
@@ -162,15 +162,6 @@ void CompareWindow::print()
     GridReport::printGrid(m_context, this, m_tabView->grid(), graph);
 }
 
-void CompareWindow::fitLabelColumn()
-{
-    GridModel &grid = m_tabView->grid();
-    const int label = grid.columnIndex(u"label"_s);
-    const int width = GridOperations::fitColumn(grid, label, m_tabView->lstGrid()->width(),
-                                                m_context.settings().scrollBarHeight, true);
-    grid.setColumnWidth(label, width);
-}
-
 void CompareWindow::layoutLoadingPanel()
 {
     m_picLoad->setGeometry(rect());
@@ -184,8 +175,6 @@ void CompareWindow::resizeEvent(QResizeEvent *event)
 {
     QDialog::resizeEvent(event);
     layoutLoadingPanel();
-    if (!m_loading)
-        fitLabelColumn();
 }
 
 void CompareWindow::done(int result)

@@ -57,7 +57,6 @@ protected:
 private:
     void loadPeriods();
     void layoutLoadingPanel();
-    void fitLabelColumn();
 
     AppContext &m_context;
     const ComparisonRanges::Kind m_kind;

@@ -4,6 +4,7 @@
 #include "gridtablemodel.h"
 
 #include "views/gridmodel.h"
+#include "views/gridoperations.h"
 
 #include <QHeaderView>
 #include <QKeyEvent>
@@ -28,8 +29,8 @@ GridView::GridView(GridModel &grid, QWidget *parent)
     // A window may destroy its grid before the view that shows it (members go before child
     // widgets); from then on the view shows nothing rather than reading a grid that is gone.
     connect(&m_grid, &QObject::destroyed, this, [this] {
-        setModel(nullptr);
         m_gridAlive = false;
+        setModel(nullptr);
     });
     connect(horizontalHeader(), &QHeaderView::sectionClicked, this,
             [this](int section) { Q_EMIT headerClicked(section + 1); });
@@ -82,6 +83,28 @@ void GridView::keyPressEvent(QKeyEvent *event)
     QTableView::keyPressEvent(event);
 }
 
+void GridView::setFittedColumn(int column)
+{
+    m_fittedColumn = column;
+    fitColumn();
+}
+
+void GridView::resizeEvent(QResizeEvent *event)
+{
+    QTableView::resizeEvent(event);
+    fitColumn();
+}
+
+void GridView::fitColumn()
+{
+    if (!m_gridAlive || m_fittedColumn < 1 || m_fittedColumn > m_grid.columnCount())
+        return;
+    // The viewport already leaves out the scroll bar and the frame.
+    const int width =
+        GridOperations::fitColumn(m_grid, m_fittedColumn, viewport()->width(), 0, false);
+    setColumnWidth(m_fittedColumn - 1, width);
+}
+
 QRect GridView::cellRect(int row, int column) const
 {
     return visualRect(m_model->index(row - 1, column - 1));
@@ -100,4 +123,5 @@ void GridView::applyLayout()
         setRowHidden(r - 1, !m_grid.isRowVisible(r));
     if (m_grid.selectedRow() > 0)
         selectRow(m_grid.selectedRow() - 1);
+    fitColumn();
 }

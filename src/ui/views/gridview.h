@@ -20,6 +20,9 @@ public:
     // With cell editing on, typed characters, Enter and F2 ask to edit the current cell
     // instead of searching the list.
     void setCellEditing(bool on) { m_cellEditing = on; }
+    // The column (1-based) that takes whatever width the other columns leave, as the view
+    // is resized; 0 for none.
+    void setFittedColumn(int column);
     // Column widths, hidden columns and rows as the grid model now has them.
     void applyLayout();
     // The cell's rectangle in the view's coordinates, for panels opened under it.
@@ -33,10 +36,14 @@ Q_SIGNALS:
 
 protected:
     void keyPressEvent(QKeyEvent *event) override;
+    void resizeEvent(QResizeEvent *event) override;
 
 private:
     GridModel &m_grid;
     GridTableModel *m_model;
     bool m_cellEditing = false;
     bool m_gridAlive = true;
+    int m_fittedColumn = 0;
+
+    void fitColumn();
 };
