@@ -56,6 +56,15 @@ void PageSetupSession::applyPageOptions(bool retainFormatting, bool todaysDate, 
     m_store.writeSetting(Footer, pageNumbers ? u"&bPage &p of &P"_s : QString(), Key);
 }
 
+void PageSetupSession::setMargins(double top, double left, double right, double bottom)
+{
+    const auto text = [](double inches) { return QString::number(inches, 'g', 4); };
+    m_store.writeSetting(MarginTop, text(top), Key);
+    m_store.writeSetting(MarginLeft, text(left), Key);
+    m_store.writeSetting(MarginRight, text(right), Key);
+    m_store.writeSetting(MarginBottom, text(bottom), Key);
+}
+
 void PageSetupSession::restore()
 {
     if (m_restored)

@@ -27,6 +27,8 @@ public:
     void applyPageOptions(bool retainFormatting, bool todaysDate, bool pageNumbers,
                           const QString &headerText);
     void restore();
+    // Margins chosen in the page set-up dialog, in inches; they last until the window closes.
+    void setMargins(double top, double left, double right, double bottom);
 
     QString keptValue(const QString &valueName) const;
 

@@ -162,7 +162,16 @@ void PrintWindow::print()
 void PrintWindow::pageSetup()
 {
     applyPageOptions();
-    m_askPageSetup(m_printer, this);
+    // The dialog shows the margins the report is printed with, and what is chosen there is
+    // what the next print uses.
+    const PrintOptions current = PrintOptions::fromStore(m_context.settingsStore());
+    m_printer.setPageMargins(QMarginsF(current.marginLeftInches, current.marginTopInches,
+                                       current.marginRightInches, current.marginBottomInches),
+                             QPageLayout::Inch);
+    if (!m_askPageSetup(m_printer, this))
+        return;
+    const QMarginsF chosen = m_printer.pageLayout().margins(QPageLayout::Inch);
+    m_pageSetup->setMargins(chosen.top(), chosen.left(), chosen.right(), chosen.bottom());
 }
 
 void PrintWindow::printPreview()

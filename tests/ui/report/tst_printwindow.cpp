@@ -41,6 +41,7 @@ private Q_SLOTS:
     void commandsApplyTheBoxes();
     void printWritesThePages();
     void closingRestoresTheUsersValues();
+    void pageSetupMarginsAreUsed();
 
 private:
     QString writePage()
@@ -176,6 +177,26 @@ void TestPrintWindow::closingRestoresTheUsersValues()
     QCOMPARE(store.readSetting(u"margin_top"_s, PageSetupSession::Key), u"0.75"_s);
     QCOMPARE(store.readSetting(u"footer"_s, PageSetupSession::Key), u"&u&b&d"_s);
     QCOMPARE(store.readSetting(u"header"_s, PageSetupSession::Key, u"<absent>"_s), u"<absent>"_s);
+}
+
+void TestPrintWindow::pageSetupMarginsAreUsed()
+{
+    PrintWindow window(m_workspace->context(), nullptr);
+    window.showPage(writePage(), u"Title"_s);
+    QMarginsF shown;
+    window.setPageSetupQuestion([&](QPrinter &printer, QWidget *) {
+        shown = printer.pageLayout().margins(QPageLayout::Inch);
+        printer.setPageMargins(QMarginsF(1.0, 0.25, 1.5, 0.5), QPageLayout::Inch);
+        return true;
+    });
+    window.pageSetup();
+    // The dialog opened on the report's margins (bottom: the browser's 0.75 inch).
+    QCOMPARE(shown, QMarginsF(0.4, 0.5, 0.4, 0.75));
+    const PrintOptions options = PrintOptions::fromStore(m_workspace->store());
+    QCOMPARE(options.marginLeftInches, 1.0);
+    QCOMPARE(options.marginTopInches, 0.25);
+    QCOMPARE(options.marginRightInches, 1.5);
+    QCOMPARE(options.marginBottomInches, 0.5);
 }
 
 QTEST_MAIN(TestPrintWindow)
