@@ -27,8 +27,10 @@ double inches(const SettingsStore &store, const QString &name, double fallback)
 
 const QStringList &PageSetupSession::valueNames()
 {
-    static const QStringList names = {MarginTop, MarginLeft,      MarginRight, Header,
-                                      Footer,    PrintBackground, ShrinkToFit};
+    // The bottom margin is kept too: the page set-up dialog may change it while the window
+    // is open, and the user's own value must come back afterwards all the same.
+    static const QStringList names = {MarginTop, MarginLeft, MarginRight,     MarginBottom,
+                                      Header,    Footer,     PrintBackground, ShrinkToFit};
     return names;
 }
 
