@@ -46,6 +46,9 @@ QImage graphPicture()
 
 int main(int argc, char *argv[])
 {
+    // Text on the picture needs fonts, and so a platform; no display is needed.
+    if (qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM"))
+        qputenv("QT_QPA_PLATFORM", "offscreen");
     QGuiApplication app(argc, argv);
     const int rounds = argc > 1 ? QString::fromLocal8Bit(argv[1]).toInt() : 100;
     const QImage picture = graphPicture();
