@@ -11,6 +11,7 @@
 #include "users/loginservice.h"
 
 #include <QCommandLineParser>
+#include <QFileInfo>
 #include <QTextStream>
 
 using namespace Qt::StringLiterals;
@@ -52,6 +53,9 @@ std::variant<Options, QString> readOptions(const QCommandLineParser &parser)
     options.user = parser.value(u"user"_s);
     options.password = parser.value(u"password"_s);
     options.settingsFile = parser.value(u"settings"_s);
+    // A mistyped path would otherwise read as settings that name nothing at all.
+    if (parser.isSet(u"settings"_s) && !QFileInfo(options.settingsFile).isFile())
+        return u"there is no settings file at %1"_s.arg(options.settingsFile);
     if (parser.isSet(u"compare"_s)) {
         options.compareKind = ComparisonRanges::kindFromText(parser.value(u"compare"_s));
         bool ok = false;

@@ -66,7 +66,8 @@ int usage(QTextStream &out)
 // should print only what concerns its user.
 void quietOffscreenRemarks(QtMsgType type, const QMessageLogContext &context, const QString &text)
 {
-    if (type == QtWarningMsg && text.startsWith(u"This plugin does not support"_s))
+    if (type == QtWarningMsg && (text.startsWith(u"This plugin does not support"_s) ||
+                                 text.startsWith(u"QStandardPaths: XDG_RUNTIME_DIR not set"_s)))
         return;
     QTextStream(stderr) << qFormatLogMessage(type, context, text) << Qt::endl;
 }

@@ -317,6 +317,9 @@ void TestCli::reportRefuses_data()
                               << u"--out names a .html or .pdf file"_s;
     QTest::newRow("compare") << QStringList{u"--compare"_s, u"decades"_s, u"--out"_s, u"x.pdf"_s}
                              << u"--compare is years or periods"_s;
+    QTest::newRow("settings") << QStringList{u"--settings"_s, u"/no/such/settings.ini"_s,
+                                             u"--out"_s, u"x.pdf"_s}
+                              << u"there is no settings file at /no/such/settings.ini"_s;
 }
 
 void TestCli::reportRefuses()
