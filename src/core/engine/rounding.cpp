@@ -24,24 +24,25 @@ double scaledThroughText(double value, int decimals)
     return text.toDouble();
 }
 
+template<typename ToWhole> double roundTo(double value, int decimals, ToWhole toWhole)
+{
+    if (!std::isfinite(value))
+        return value;
+    const double rounded = toWhole(scaledThroughText(value, decimals)) / std::pow(10.0, decimals);
+    return rounded == 0.0 ? 0.0 : rounded; // no "-0"
+}
+
 } // namespace
 
 double halfAwayFromZero(double value, int decimals)
 {
-    if (!std::isfinite(value))
-        return value;
-    const double scaled = scaledThroughText(value, decimals);
-    const double rounded = std::round(scaled) / std::pow(10.0, decimals);
-    return rounded == 0.0 ? 0.0 : rounded;
+    return roundTo(value, decimals, [](double scaled) { return std::round(scaled); });
 }
 
 double halfToEven(double value, int decimals)
 {
-    if (!std::isfinite(value))
-        return value;
-    const double scaled = scaledThroughText(value, decimals);
-    const double rounded = std::nearbyint(scaled) / std::pow(10.0, decimals);
-    return rounded == 0.0 ? 0.0 : rounded;
+    // nearbyint rounds halves to even in the default rounding mode.
+    return roundTo(value, decimals, [](double scaled) { return std::nearbyint(scaled); });
 }
 
 } // namespace Rounding

@@ -1,6 +1,8 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "gifencoder.h"
 
+#include "engine/rounding.h"
+
 #include <QCoreApplication>
 #include <QSaveFile>
 
@@ -118,17 +120,6 @@ void appendWord(QByteArray &out, int value)
 {
     out.append(char(value & 0xFF));
     out.append(char((value >> 8) & 0xFF));
-}
-
-// row * 100 / rows, to the nearest whole number with halves to the even one.
-int percentOf(int row, int rows)
-{
-    const qint64 scaled = qint64(row) * 100;
-    qint64 quotient = scaled / rows;
-    const qint64 twiceRemainder = 2 * (scaled % rows);
-    if (twiceRemainder > rows || (twiceRemainder == rows && quotient % 2 != 0))
-        ++quotient;
-    return int(quotient);
 }
 
 struct IndexedPicture
@@ -307,7 +298,8 @@ QByteArray GifEncoder::encodeImage(const QImage &picture, std::optional<QRgb> tr
         }
         codes.write(current);
         if (row % ProgressEvery == 0) {
-            Q_EMIT progress(percentOf(row, height));
+            // A true half (62.5 for row 10 of 16) is exact in binary and goes to the even one.
+            Q_EMIT progress(int(Rounding::halfToEven(row * 100.0 / height, 0)));
             if (QCoreApplication::instance())
                 QCoreApplication::processEvents();
         }
