@@ -3,6 +3,7 @@
 
 #include "databaseverbs.h"
 #include "demoverb.h"
+#include "gifverb.h"
 #include "passwordverbs.h"
 #include "produceverb.h"
 #include "reportverb.h"

@@ -6,20 +6,17 @@
 #include "app/appcontext.h"
 #include "app/fileoperations.h"
 #include "app/settingsstore.h"
-#include "report/gifencoder.h"
 #include "report/gridhtml.h"
 #include "report/gridreport.h"
 #include "report/pagesetup.h"
 #include "report/reportrenderer.h"
 #include "views/comparewindow.h"
-#include "views/grapharea.h"
 #include "views/kpitabview.h"
 #include "views/tabviewbuilder.h"
 
 #include <QCommandLineParser>
 #include <QEventLoop>
 #include <QFileInfo>
-#include <QImageReader>
 #include <QPdfWriter>
 #include <QTextStream>
 
@@ -75,19 +72,19 @@ private:
     KpiTabView *m_view = nullptr;
 };
 
-int writePdf(AppContext &context, const QString &page, const QString &title, const QString &out)
+int writePdf(AppContext &context, const GridModel &grid, const QString &picture, const QString &out)
 {
     // The same page set-up the print window applies with its boxes ticked, put back after.
+    const QString title = GridReport::reportTitle(context);
     PageSetupSession pageSetup(context.settingsStore());
     pageSetup.applyPageOptions(true, true, true, title);
-    PrintOptions options = PrintOptions::fromStore(context.settingsStore());
-    options.windowTitle = u"Page Preview"_s;
-    options.locale = context.numberFormat().locale();
+    const PrintOptions options = PrintOptions::fromStore(
+        context.settingsStore(), context.numberFormat().locale(), u"Page Preview"_s);
     QPdfWriter writer(out);
     writer.setTitle(title);
     writer.setCreator(u"Veltrix"_s);
-    const QString html = FileOperations::readTextFile(page);
-    if (ReportRenderer(html, QFileInfo(page).absolutePath()).print(writer, options) == 0) {
+    const QString html = GridHtml::reportPage(grid, u"id"_s, picture);
+    if (ReportRenderer(html, context.settings().tempFolder).print(writer, options) == 0) {
         QTextStream(stderr) << "veltrix-cli report: could not write " << out << Qt::endl;
         return 1;
     }
@@ -146,58 +143,10 @@ int report(const QStringList &arguments)
     ReportView report(context, options, tab);
     KpiTabView &view = report.view();
 
-    const QString picture = tab == TabViewBuilder::SummaryTab
-                                ? GridReport::captureGraphPicture(context, *view.picGraph())
-                                : QString();
-    const QString title = GridReport::reportTitle(context);
-    if (suffix == u"pdf"_s) {
-        const QString page = GridReport::writeReportPage(context, view.grid(), u"id"_s, picture);
-        return writePdf(context, page, title, out);
-    }
+    const QString picture = GridReport::graphPicture(context, view);
+    if (suffix == u"pdf"_s)
+        return writePdf(context, view.grid(), picture, out);
     return writeHtml(context, view.grid(), picture, out);
 }
 
 } // namespace ReportVerb
-
-namespace GifVerb {
-
-int encodeGif(const QStringList &arguments)
-{
-    QCommandLineParser parser;
-    parser.addOption({u"transparent"_s, u"transparent colour"_s, u"RRGGBB"_s});
-    parser.addPositionalArgument(u"in"_s, u"picture"_s);
-    parser.addPositionalArgument(u"out"_s, u"GIF file"_s);
-    QTextStream err(stderr);
-    if (!parser.parse(QStringList{u"veltrix-cli encode-gif"_s} + arguments) ||
-        parser.positionalArguments().size() != 2) {
-        err << "usage: veltrix-cli encode-gif IN OUT.gif [--transparent RRGGBB]" << Qt::endl;
-        return 2;
-    }
-    std::optional<QRgb> transparent;
-    if (parser.isSet(u"transparent"_s)) {
-        const QString text = parser.value(u"transparent"_s).remove(u'#');
-        bool ok = false;
-        const uint rgb = text.toUInt(&ok, 16);
-        if (!ok || text.size() != 6) {
-            err << "veltrix-cli encode-gif: --transparent is a colour written RRGGBB" << Qt::endl;
-            return 2;
-        }
-        transparent = rgb;
-    }
-    const QString in = parser.positionalArguments().at(0);
-    QImageReader reader(in);
-    const QImage picture = reader.read();
-    if (picture.isNull()) {
-        err << "veltrix-cli encode-gif: cannot read " << in << ": " << reader.errorString()
-            << Qt::endl;
-        return 1;
-    }
-    GifEncoder encoder;
-    if (!encoder.saveGif(picture, parser.positionalArguments().at(1), transparent)) {
-        err << "veltrix-cli encode-gif: " << encoder.errorString() << Qt::endl;
-        return 1;
-    }
-    return 0;
-}
-
-} // namespace GifVerb

@@ -12,10 +12,3 @@ namespace ReportVerb {
 int report(const QStringList &arguments);
 
 } // namespace ReportVerb
-
-namespace GifVerb {
-
-// encode-gif IN OUT.gif [--transparent RRGGBB]
-int encodeGif(const QStringList &arguments);
-
-} // namespace GifVerb

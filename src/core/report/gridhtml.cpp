@@ -4,8 +4,6 @@
 #include "app/fileoperations.h"
 #include "views/gridmodel.h"
 
-#include <QLocale>
-
 #include <cmath>
 
 using namespace Qt::StringLiterals;
@@ -138,6 +136,12 @@ QString gridToHtml(const GridModel &grid, const QString &exclusions)
     }
     html += u"</table>"_s + Crlf;
     return html;
+}
+
+QString reportTitle(const QDate &start, const QDate &end, const QLocale &locale)
+{
+    return locale.toString(start, QLocale::ShortFormat) + u" to "_s +
+           locale.toString(end, QLocale::ShortFormat);
 }
 
 QString reportPage(const GridModel &grid, const QString &exclusions, const QString &picturePath)

@@ -2,6 +2,8 @@
 #pragma once
 
 #include <QColor>
+#include <QDate>
+#include <QLocale>
 #include <QString>
 #include <QStringList>
 
@@ -20,6 +22,8 @@ bool isInList(const QStringList &list, const QString &text, bool caseSensitive);
 QString gridToHtml(const GridModel &grid, const QString &exclusions);
 // The whole page; the picture paragraph only when the path names an existing file.
 QString reportPage(const GridModel &grid, const QString &exclusions, const QString &picturePath);
+// The report's title: the produced range, "1/7/25 to 30/6/26" in the region's short dates.
+QString reportTitle(const QDate &start, const QDate &end, const QLocale &locale);
 // A font size as the page writes it: "10.25", "12".
 QString fontSizeText(double points);
 

@@ -82,9 +82,12 @@ QString PageSetupSession::keptValue(const QString &valueName) const
     return index < 0 ? QString() : m_kept.at(index);
 }
 
-PrintOptions PrintOptions::fromStore(const SettingsStore &store)
+PrintOptions PrintOptions::fromStore(const SettingsStore &store, const QLocale &locale,
+                                     const QString &windowTitle)
 {
     PrintOptions options;
+    options.locale = locale;
+    options.windowTitle = windowTitle;
     options.marginTopInches = inches(store, MarginTop, options.marginTopInches);
     options.marginBottomInches = inches(store, MarginBottom, options.marginBottomInches);
     options.marginLeftInches = inches(store, MarginLeft, options.marginLeftInches);

@@ -52,5 +52,6 @@ struct PrintOptions
     QString windowTitle;
     QLocale locale; // of the date in the header and footer
 
-    static PrintOptions fromStore(const SettingsStore &store);
+    static PrintOptions fromStore(const SettingsStore &store, const QLocale &locale = QLocale(),
+                                  const QString &windowTitle = {});
 };

@@ -9,7 +9,6 @@
 #include "setup/programsetupdialog.h"
 #include "users/useraccountsdialog.h"
 #include "views/comparewindow.h"
-#include "views/grapharea.h"
 #include "views/kpitabview.h"
 #include "views/tabbuttons.h"
 
@@ -376,10 +375,7 @@ void MainWindow::produce()
 
 void MainWindow::print()
 {
-    QWidget *graph = nullptr;
-    if (m_currentTab == TabViewBuilder::SummaryTab)
-        graph = m_tabView->picGraph();
-    GridReport::printGrid(m_context, this, m_tabView->grid(), graph);
+    GridReport::printGrid(m_context, this, *m_tabView);
 }
 
 namespace {

@@ -11,8 +11,9 @@
 #include "engine/perioddataset.h"
 #include "report/graphsnapshot.h"
 #include "report/gridhtml.h"
-
-#include <QWidget>
+#include "views/grapharea.h"
+#include "views/kpitabview.h"
+#include "views/tabviewbuilder.h"
 
 using namespace Qt::StringLiterals;
 
@@ -21,17 +22,17 @@ namespace GridReport {
 QString reportTitle(AppContext &context)
 {
     const PeriodDataSet::Range range = context.periodDataSet().range(0);
-    const QLocale &locale = context.numberFormat().locale();
-    return locale.toString(range.start, QLocale::ShortFormat) + u" to "_s +
-           locale.toString(range.end, QLocale::ShortFormat);
+    return GridHtml::reportTitle(range.start, range.end, context.numberFormat().locale());
 }
 
-QString captureGraphPicture(AppContext &context, QWidget &graph)
+QString graphPicture(AppContext &context, KpiTabView &view)
 {
+    if (view.currentTab() != TabViewBuilder::SummaryTab)
+        return {};
     const Settings &settings = context.settings();
     FileOperations::folderExists(settings.tempFolder, true);
     // Rendering the view draws its bars, which are child widgets, into the same picture.
-    const QImage rendered = graph.grab().toImage();
+    const QImage rendered = view.picGraph()->grab().toImage();
     if (const std::optional<QString> failure =
             GraphSnapshot::writeSnapshot(rendered, {settings.tempGifFile, settings.tempBmpFile})) {
         context.prompter().message(*failure, u"Print"_s, Prompter::Icon::Exclamation);
@@ -40,27 +41,20 @@ QString captureGraphPicture(AppContext &context, QWidget &graph)
     return settings.tempBmpFile;
 }
 
-QString writeReportPage(AppContext &context, const GridModel &grid, const QString &exclusions,
-                        const QString &picturePath)
-{
-    const QString path = context.settings().tempHtmlFile;
-    FileOperations::folderExists(context.settings().tempFolder, true);
-    FileOperations::writeTextFile(path, GridHtml::reportPage(grid, exclusions, picturePath),
-                                  context.prompter());
-    return path;
-}
-
 void showGridReport(AppContext &context, QWidget *owner, const GridModel &grid,
                     const QString &exclusions, const QString &title, const QString &picturePath)
 {
-    const QString page = writeReportPage(context, grid, exclusions, picturePath);
+    const QString page = context.settings().tempHtmlFile;
+    FileOperations::folderExists(context.settings().tempFolder, true);
+    FileOperations::writeTextFile(page, GridHtml::reportPage(grid, exclusions, picturePath),
+                                  context.prompter());
     PrintWindow::loadPage(context, owner, page, title);
 }
 
-void printGrid(AppContext &context, QWidget *owner, const GridModel &grid, QWidget *graph)
+void printGrid(AppContext &context, QWidget *owner, KpiTabView &view)
 {
-    const QString picture = graph ? captureGraphPicture(context, *graph) : QString();
-    showGridReport(context, owner, grid, u"id"_s, reportTitle(context), picture);
+    const QString picture = graphPicture(context, view);
+    showGridReport(context, owner, view.grid(), u"id"_s, reportTitle(context), picture);
 }
 
 } // namespace GridReport

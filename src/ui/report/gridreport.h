@@ -5,22 +5,21 @@
 
 class AppContext;
 class GridModel;
+class KpiTabView;
 class QWidget;
 
 // The print command of the KPI windows: the grid as a report page, with a picture of the bar
 // graph below it when the graph is showing, opened in the print window.
 namespace GridReport {
 
-// "1/07/2025 to 30/06/2026": the produced range in the region's short date form.
+// "1/7/25 to 30/6/26": the produced range in the region's short date form.
 QString reportTitle(AppContext &context);
-// Captures the graph into the temporary bitmap; the path on success, empty otherwise.
-QString captureGraphPicture(AppContext &context, QWidget &graph);
-// Writes the report page of the grid; the page's path.
-QString writeReportPage(AppContext &context, const GridModel &grid, const QString &exclusions,
-                        const QString &picturePath);
+// The picture of the view's graph in the temporary bitmap when the view shows its graph (the
+// Summary tab); empty on other tabs or when the picture could not be made (said so).
+QString graphPicture(AppContext &context, KpiTabView &view);
 void showGridReport(AppContext &context, QWidget *owner, const GridModel &grid,
                     const QString &exclusions, const QString &title, const QString &picturePath);
-// The whole command: graph is the visible graph view, or nullptr on a tab without one.
-void printGrid(AppContext &context, QWidget *owner, const GridModel &grid, QWidget *graph);
+// The Print command of a KPI window: its grid, and its graph when it shows one.
+void printGrid(AppContext &context, QWidget *owner, KpiTabView &view);
 
 } // namespace GridReport

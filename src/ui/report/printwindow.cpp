@@ -146,9 +146,8 @@ void PrintWindow::applyPageOptions()
 
 int PrintWindow::renderTo(QPagedPaintDevice &device) const
 {
-    PrintOptions options = PrintOptions::fromStore(m_context.settingsStore());
-    options.windowTitle = windowTitle();
-    options.locale = m_context.numberFormat().locale();
+    const PrintOptions options = PrintOptions::fromStore(
+        m_context.settingsStore(), m_context.numberFormat().locale(), windowTitle());
     return ReportRenderer(m_html, QFileInfo(m_pagePath).absolutePath()).print(device, options);
 }
 

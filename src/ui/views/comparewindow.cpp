@@ -2,7 +2,6 @@
 #include "comparewindow.h"
 
 #include "bargraphitem.h"
-#include "grapharea.h"
 #include "gridview.h"
 #include "kpitabview.h"
 #include "tabbuttons.h"
@@ -156,10 +155,7 @@ void CompareWindow::print()
 {
     if (m_loading)
         return;
-    QWidget *graph = nullptr;
-    if (m_currentTab == TabViewBuilder::SummaryTab)
-        graph = m_tabView->picGraph();
-    GridReport::printGrid(m_context, this, m_tabView->grid(), graph);
+    GridReport::printGrid(m_context, this, *m_tabView);
 }
 
 void CompareWindow::layoutLoadingPanel()
