@@ -109,13 +109,14 @@ QList<TabViewBuilder::GraphBar> TabViewBuilder::graphBars(const GridModel &grid,
         if (grid.cellText(row, benchmarkColumn).isEmpty())
             continue;
         const qint64 id = grid.cellText(row, 1).toLongLong();
+        // A Field without a record has no benchmark to draw against in any period.
+        if (!records.findRecordById(database.fieldsRecordset(), id))
+            continue;
+        const QString benchmark = database.fieldsRecordset().value(u"Data"_s).toString();
         for (int slot = pastCount; slot >= 0; --slot) {
             data.setCurrentSlot(quint8(slot));
-            const int pos = data.current().findFieldPos(id);
-            if (pos == 0 || !records.findRecordById(database.fieldsRecordset(), id))
-                continue;
-            bars << GraphBar{id, database.fieldsRecordset().value(u"Data"_s).toString(),
-                             data.getFieldAbs(id)};
+            if (data.current().findFieldPos(id) != 0)
+                bars << GraphBar{id, benchmark, data.getFieldAbs(id)};
         }
     }
     data.setCurrentSlot(0);
