@@ -84,8 +84,12 @@ QString ReportRenderer::printableHtml(const QString &html)
 {
     // A size without a unit counts as pixels in a browser; the text engine would drop it.
     static const QRegularExpression unitless(u"(font-size:\\s*[0-9]+(?:\\.[0-9]+)?)\\s*;"_s);
+    // A browser reads "<" as the start of a tag only before a letter, "/", "!" or "?"; a
+    // benchmark such as "<45%" is text to it. The text engine would swallow it as a tag.
+    static const QRegularExpression bareLessThan(u"<(?![A-Za-z/!?])"_s);
     QString printable = html;
     printable.replace(unitless, u"\\1px;"_s);
+    printable.replace(bareLessThan, u"&lt;"_s);
     return printable;
 }
 

@@ -8,6 +8,7 @@
 #include <QStandardPaths>
 #include <QTemporaryDir>
 #include <QTest>
+#include <QTextDocument>
 
 using namespace Qt::StringLiterals;
 
@@ -76,7 +77,8 @@ private Q_SLOTS:
     void initTestCase();
     void expandCodes_data();
     void expandCodes();
-    void unitlessFontSizesBecomePixels();
+    void printableHtml_data();
+    void printableHtml();
     void printsHeaderFooterAndPages();
     void backgroundsFollowTheOption();
     void pictureIsPrintedAndWidePagesShrink();
@@ -116,11 +118,32 @@ void TestReportPrint::expandCodes()
     QCOMPARE((QStringList{margins.left, margins.centre, margins.right}), parts);
 }
 
-void TestReportPrint::unitlessFontSizesBecomePixels()
+void TestReportPrint::printableHtml_data()
 {
-    QCOMPARE(ReportRenderer::printableHtml(u"<td style='font-size:10.25;font-weight:bold;'>"_s),
-             u"<td style='font-size:10.25px;font-weight:bold;'>"_s);
-    QCOMPARE(ReportRenderer::printableHtml(u"font-size:12pt;"_s), u"font-size:12pt;"_s);
+    QTest::addColumn<QString>("html");
+    QTest::addColumn<QString>("printable");
+    QTest::addColumn<QString>("shown");
+    QTest::newRow("unitless size in pixels")
+        << u"<td style='font-size:10.25;font-weight:bold;'>7</td>"_s
+        << u"<td style='font-size:10.25px;font-weight:bold;'>7</td>"_s << u"7"_s;
+    QTest::newRow("size with unit kept")
+        << u"<p style='font-size:12pt;'>x</p>"_s << u"<p style='font-size:12pt;'>x</p>"_s << u"x"_s;
+    QTest::newRow("at-most benchmark is text")
+        << u"<p>&lt;9% <45%</p>"_s << u"<p>&lt;9% &lt;45%</p>"_s << u"<9% <45%"_s;
+    QTest::newRow("both markers") << u"<p><0.5,>1</p>"_s << u"<p>&lt;0.5,>1</p>"_s << u"<0.5,>1"_s;
+    QTest::newRow("tags and comments stay mark-up")
+        << u"<p>a</p><!-- b --><br/>"_s << u"<p>a</p><!-- b --><br/>"_s << u"a"_s;
+}
+
+void TestReportPrint::printableHtml()
+{
+    QFETCH(QString, html);
+    QFETCH(QString, printable);
+    QFETCH(QString, shown);
+    QCOMPARE(ReportRenderer::printableHtml(html), printable);
+    QTextDocument document;
+    document.setHtml(ReportRenderer::printableHtml(html));
+    QCOMPARE(document.toPlainText().trimmed(), shown.trimmed());
 }
 
 void TestReportPrint::printsHeaderFooterAndPages()
