@@ -11,6 +11,7 @@
 #include <QJsonDocument>
 #include <QJsonObject>
 #include <QProcess>
+#include <QRegularExpression>
 #include <QSqlQuery>
 #include <QStandardPaths>
 #include <QTemporaryDir>
@@ -68,9 +69,12 @@ private Q_SLOTS:
     void produceCsv();
     void produceJsonWithComparison();
     void produceRespectsTheUsersLines();
+    void produceShowsALossAsALoss();
     void produceRefuses_data();
     void produceRefuses();
     void reportPdfShowsTitleGridAndGraph();
+    void reportPrintsEveryBenchmark_data();
+    void reportPrintsEveryBenchmark();
     void reportHtmlKeepsItsPicture();
     void reportRefuses_data();
     void reportRefuses();
@@ -203,6 +207,14 @@ void TestCli::produceRespectsTheUsersLines()
     QCOMPARE(tabsWithValues, (QSet<QString>{u"1"_s, u"2"_s, u"5"_s}));
 }
 
+void TestCli::produceShowsALossAsALoss()
+{
+    const QStringList lines = produce({u"--from"_s, u"2021-01"_s, u"--to"_s, u"2021-01"_s,
+                                       u"--user"_s, u"manager"_s, u"--password"_s, u"manager1"_s});
+    const QString netProfit = lines.filter(u",6380,Net profit,5,"_s).value(0);
+    QVERIFY2(netProfit.contains(u",\"$ -22,480.57\",-22480.57,22480.57,"_s), qPrintable(netProfit));
+}
+
 void TestCli::produceRefuses_data()
 {
     QTest::addColumn<QStringList>("arguments");
@@ -281,6 +293,27 @@ void TestCli::reportPdfShowsTitleGridAndGraph()
     QVERIFY(heading >= 0);
     QVERIFY(bar >= 0);
     QVERIFY(bar > heading); // the graph stands below the grid
+}
+
+void TestCli::reportPrintsEveryBenchmark_data()
+{
+    QTest::addColumn<QString>("tab");
+    QTest::addColumn<int>("benchmarks"); // percentage rows of the tab
+    QTest::newRow("Summary") << u"1"_s << 7;
+    QTest::newRow("Paint, every benchmark an at-most one") << u"4"_s << 8;
+    QTest::newRow("Financial") << u"6"_s << 8;
+}
+
+void TestCli::reportPrintsEveryBenchmark()
+{
+    QFETCH(QString, tab);
+    QFETCH(int, benchmarks);
+    const QString pdf = m_dir.filePath(u"tab%1.pdf"_s.arg(tab));
+    const Run run = report({u"--tab"_s, tab, u"--out"_s, pdf});
+    QVERIFY2(run.exitCode == 0, qPrintable(run.err));
+    const QString text = runTool(u"pdftotext"_s, {u"-layout"_s, pdf, u"-"_s});
+    static const QRegularExpression benchmark(u"[<>][0-9.]+%"_s);
+    QCOMPARE(text.count(benchmark), benchmarks);
 }
 
 void TestCli::reportHtmlKeepsItsPicture()

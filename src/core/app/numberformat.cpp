@@ -63,9 +63,12 @@ QString NumberFormat::formatMoney(const QVariant &value, bool withSymbol) const
         return {};
     if (*number == 0.0)
         return withSymbol ? u"$ -"_s : u"0.00"_s;
-    // Formatted with a dollar sign so that the region's placement of the symbol and of the
-    // minus sign apply, then the sign is taken out again and put in front.
-    QString text = m_locale.toCurrencyString(*number, Dollar, 2).remove(Dollar).trimmed();
+    // The region's digits and grouping, but always a minus sign: a region's accounting
+    // brackets are easily read as an ordinary amount, and a loss must not pass for a profit.
+    QString text =
+        m_locale.toCurrencyString(std::fabs(*number), Dollar, 2).remove(Dollar).trimmed();
+    if (*number < 0)
+        text.prepend(m_locale.negativeSign());
     return withSymbol ? u"$ "_s + text : text;
 }
 

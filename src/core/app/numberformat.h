@@ -20,7 +20,8 @@ public:
     static QLocale userLocale();
     const QLocale &locale() const { return m_locale; }
 
-    // "$ 1,234.50"; zero is "$ -" ("0.00" without the symbol); not a number gives empty text.
+    // "$ 1,234.50", "$ -1,234.50"; zero is "$ -" ("0.00" without the symbol); not a number gives
+    // empty text.
     QString formatMoney(const QVariant &value, bool withSymbol = true) const;
     // The value as a number, or 0 for anything that is not one (empty text included).
     double toNumber(const QVariant &value) const;

@@ -16,10 +16,10 @@ double scale(double twipsPerPixelY)
 }
 
 Bar layoutBar(const QString &optimalString, double actual, double twipsPerPixelY,
-              const NumberFormat &numbers)
+              const NumberFormat &numbers, qint64 fieldId)
 {
     Bar bar;
-    bar.evaluation = KpiEvaluation::evaluateBenchmark(optimalString, actual, numbers);
+    bar.evaluation = KpiEvaluation::evaluateField(fieldId, optimalString, actual, numbers);
     const double s = scale(twipsPerPixelY);
     const KpiEvaluation::Result &e = bar.evaluation;
     bar.extraHeight = int(std::lround(std::fabs(e.variant) * s));
@@ -33,6 +33,13 @@ Bar layoutBar(const QString &optimalString, double actual, double twipsPerPixelY
         bar.optimalLineY = atMost ? bar.extraHeight : 0;
     }
     bar.columnHeight = std::max(0, int(std::lround(height)));
+    if (actual < 0) {
+        // Nothing can stand below the base line: the bar reaches its optimal and all of it is
+        // the shortfall.
+        bar.columnHeight = std::max(0, int(std::lround(e.optimal * s)));
+        bar.extraHeight = bar.columnHeight;
+        bar.optimalLineY = 0;
+    }
     bar.extraVisible = bar.extraHeight > 0;
     return bar;
 }

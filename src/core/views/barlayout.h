@@ -23,8 +23,9 @@ struct Bar
 
 // Two pixels per percentage point at 15 twips per pixel (96 dpi), more on denser screens.
 double scale(double twipsPerPixelY);
+// The Field, when known, judges a figure of the wrong sign red.
 Bar layoutBar(const QString &optimalString, double actual, double twipsPerPixelY,
-              const NumberFormat &numbers);
+              const NumberFormat &numbers, qint64 fieldId = 0);
 // "+2.5%" above the optimal, "-3%" below, "0%" on it.
 QString tooltip(double variant, const NumberFormat &numbers);
 

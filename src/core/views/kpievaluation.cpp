@@ -3,6 +3,7 @@
 
 #include "app/numberformat.h"
 #include "engine/rounding.h"
+#include "engine/usualsign.h"
 
 using namespace Qt::StringLiterals;
 
@@ -51,6 +52,15 @@ Result evaluateBenchmark(const QString &benchmark, double actual, const NumberFo
     }
     result.band = firstVariant >= 0 ? Green : (variant >= 0 ? Yellow : Red);
     result.variant = firstVariant;
+    return result;
+}
+
+Result evaluateField(qint64 fieldId, const QString &benchmark, double actual,
+                     const NumberFormat &numbers)
+{
+    Result result = evaluateBenchmark(benchmark, actual, numbers);
+    if (UsualSign::isUnusual(fieldId, actual))
+        result.band = Red;
     return result;
 }
 

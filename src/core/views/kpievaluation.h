@@ -26,6 +26,11 @@ struct Result
 Result evaluateBenchmark(const QString &benchmark, double actual, const NumberFormat &numbers,
                          Result result = {});
 
+// A Field's figure judged against its benchmark: a figure whose sign is opposite to the
+// Field's usual one (a negative margin) is red whatever its magnitude would say.
+Result evaluateField(qint64 fieldId, const QString &benchmark, double actual,
+                     const NumberFormat &numbers);
+
 // The benchmark cell: the optimal element followed by "%".
 QString benchmarkCellText(const QString &benchmark);
 

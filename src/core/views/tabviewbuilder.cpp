@@ -116,7 +116,7 @@ QList<TabViewBuilder::GraphBar> TabViewBuilder::graphBars(const GridModel &grid,
         for (int slot = pastCount; slot >= 0; --slot) {
             data.setCurrentSlot(quint8(slot));
             if (data.current().findFieldPos(id) != 0)
-                bars << GraphBar{id, benchmark, data.getFieldAbs(id)};
+                bars << GraphBar{id, benchmark, data.getFieldValue(id)};
         }
     }
     data.setCurrentSlot(0);

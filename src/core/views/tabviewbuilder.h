@@ -23,7 +23,7 @@ public:
     // The columns of the comparison grid: the earlier periods' columns start hidden.
     static void addCompareColumns(GridModel &grid);
 
-    // One bar of the graph: a percentage Field with data in the current slot.
+    // One bar of the graph: a percentage Field with data in the current slot, its signed value.
     struct GraphBar
     {
         qint64 fieldId = 0;

@@ -75,7 +75,7 @@ void BarGraphItem::setAutoWidth(bool on)
 void BarGraphItem::setActualValue(double value)
 {
     m_actual = value;
-    m_bar = BarLayout::layoutBar(m_optimalString, value, twipsPerPixelY(this), m_numbers);
+    m_bar = BarLayout::layoutBar(m_optimalString, value, twipsPerPixelY(this), m_numbers, m_tag);
     resize(width(), m_bar.columnHeight);
     update();
 }

@@ -20,7 +20,8 @@ public:
     bool autoWidth() const { return m_autoWidth; }
     void setAutoWidth(bool on);
     QString optimalString() const { return m_optimalString; }
-    // Set the benchmark first: the value is judged against the benchmark set at the time.
+    // Set the benchmark and the tag first: the value is judged against the benchmark set at
+    // the time, and a figure of the wrong sign for the Field in the tag is red.
     void setOptimalString(const QString &benchmark) { m_optimalString = benchmark; }
     double actualValue() const { return m_actual; }
     void setActualValue(double value);

@@ -52,8 +52,8 @@ void TestNumberFormat::formatMoney_data()
     QTest::newRow("AU zero") << Australia << QVariant(0) << true << u"$ -"_s;
     QTest::newRow("AU zero without symbol") << Australia << QVariant(0.0) << false << u"0.00"_s;
     QTest::newRow("AU zero as text") << Australia << QVariant(u"0"_s) << true << u"$ -"_s;
-    // The region writes negative amounts in accounting brackets.
-    QTest::newRow("AU negative") << Australia << QVariant(-5) << true << u"$ (5.00)"_s;
+    // A minus sign even where the region writes accounting brackets.
+    QTest::newRow("AU negative") << Australia << QVariant(-5) << true << u"$ -5.00"_s;
     QTest::newRow("AU millions") << Australia << QVariant(u"1234567.891"_s) << true
                                  << u"$ 1,234,567.89"_s;
     QTest::newRow("AU not a number") << Australia << QVariant(u"n/a"_s) << true << QString();

@@ -32,13 +32,18 @@ void TestBarLayout::bars_data()
     QTest::addColumn<int>("extra");
     QTest::addColumn<int>("lineY");
     QTest::addColumn<int>("band");
-    QTest::newRow("at most, met") << u"<30"_s << 25.0 << 60 << 10 << 0 << 2;
-    QTest::newRow("at least, met") << u">20"_s << 25.0 << 50 << 10 << 10 << 2;
-    QTest::newRow("at most, yellow") << u"<30,>40"_s << 35.0 << 70 << 10 << 10 << 1;
-    QTest::newRow("at least, red") << u">20,<10"_s << 5.0 << 40 << 30 << 0 << 0;
-    QTest::newRow("exactly the optimal") << u">20"_s << 20.0 << 40 << 0 << 0 << 2;
-    QTest::newRow("no benchmark yet") << QString() << 25.0 << 0 << 0 << 0 << 0;
-    QTest::newRow("value of zero") << u"<30"_s << 0.0 << 0 << 0 << 0 << 0;
+    QTest::addColumn<qint64>("field");
+    QTest::newRow("at most, met") << u"<30"_s << 25.0 << 60 << 10 << 0 << 2 << qint64(0);
+    QTest::newRow("at least, met") << u">20"_s << 25.0 << 50 << 10 << 10 << 2 << qint64(0);
+    QTest::newRow("at most, yellow") << u"<30,>40"_s << 35.0 << 70 << 10 << 10 << 1 << qint64(0);
+    QTest::newRow("at least, red") << u">20,<10"_s << 5.0 << 40 << 30 << 0 << 0 << qint64(0);
+    QTest::newRow("exactly the optimal") << u">20"_s << 20.0 << 40 << 0 << 0 << 2 << qint64(0);
+    QTest::newRow("no benchmark yet") << QString() << 25.0 << 0 << 0 << 0 << 0 << qint64(0);
+    // Below the base line there is nothing to draw: the bar stands at its optimal, all of it
+    // marked as the shortfall, red whatever the benchmark says of the magnitude.
+    QTest::newRow("negative share") << u"<20,>26"_s << -5.0 << 40 << 40 << 0 << 0 << qint64(109);
+    QTest::newRow("negative margin") << u">8,<4"_s << -16.0 << 16 << 16 << 0 << 0 << qint64(111);
+    QTest::newRow("value of zero") << u"<30"_s << 0.0 << 0 << 0 << 0 << 0 << qint64(0);
 }
 
 void TestBarLayout::bars()
@@ -49,7 +54,8 @@ void TestBarLayout::bars()
     QFETCH(int, extra);
     QFETCH(int, lineY);
     QFETCH(int, band);
-    const BarLayout::Bar bar = BarLayout::layoutBar(benchmark, value, 15.0, m_numbers);
+    QFETCH(qint64, field);
+    const BarLayout::Bar bar = BarLayout::layoutBar(benchmark, value, 15.0, m_numbers, field);
     QCOMPARE(bar.columnHeight, height);
     QCOMPARE(bar.extraHeight, extra);
     QCOMPARE(bar.extraVisible, extra > 0);

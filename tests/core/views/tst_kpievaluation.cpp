@@ -1,6 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "app/numberformat.h"
 #include "engine/perioddataset.h"
+#include "engine/usualsign.h"
 #include "views/comparisonranges.h"
 #include "views/kpievaluation.h"
 
@@ -17,6 +18,8 @@ private Q_SLOTS:
     void evaluateBenchmark_data();
     void evaluateBenchmark();
     void nothingToEvaluateKeepsTheCallersValues();
+    void wrongSignIsShownAndPoor_data();
+    void wrongSignIsShownAndPoor();
     void benchmarkCell();
     void comparisonRanges_data();
     void comparisonRanges();
@@ -77,6 +80,36 @@ void TestKpiEvaluation::nothingToEvaluateKeepsTheCallersValues()
         QCOMPARE(result.variant, 2.0);
         QCOMPARE(int(result.band), int(Yellow));
     }
+}
+
+void TestKpiEvaluation::wrongSignIsShownAndPoor_data()
+{
+    QTest::addColumn<qint64>("field");
+    QTest::addColumn<double>("value"); // signed, as the data set reads it
+    QTest::addColumn<QString>("benchmark");
+    QTest::addColumn<double>("shown");
+    QTest::addColumn<int>("band");
+
+    QTest::newRow("net loss") << qint64(110) << -22480.57 << QString() << -22480.57 << 0;
+    QTest::newRow("net profit") << qint64(110) << 10690.09 << QString() << 10690.09 << 0;
+    QTest::newRow("cost as a magnitude") << qint64(89) << -5000.0 << QString() << 5000.0 << 0;
+    QTest::newRow("cost account in credit") << qint64(85) << 500.0 << QString() << -500.0 << 0;
+    QTest::newRow("negative net margin") << qint64(111) << -16.0 << u">8,<4"_s << -16.0 << 0;
+    QTest::newRow("net margin met") << qint64(111) << 12.0 << u">8,<4"_s << 12.0 << 2;
+    QTest::newRow("negative share never green") << qint64(109) << -5.0 << u"<20,>26"_s << -5.0 << 0;
+    QTest::newRow("Field of unknown sign") << qint64(999) << -7.0 << u"<20"_s << 7.0 << 2;
+}
+
+void TestKpiEvaluation::wrongSignIsShownAndPoor()
+{
+    QFETCH(qint64, field);
+    QFETCH(double, value);
+    QFETCH(QString, benchmark);
+    QFETCH(double, shown);
+    QFETCH(int, band);
+    QCOMPARE(UsualSign::shown(field, value), shown);
+    QCOMPARE(UsualSign::isUnusual(field, value), shown < 0);
+    QCOMPARE(int(evaluateField(field, benchmark, value, m_numbers).band), band);
 }
 
 void TestKpiEvaluation::benchmarkCell()

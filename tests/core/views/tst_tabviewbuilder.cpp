@@ -3,6 +3,7 @@
 
 #include "app/settingsloader.h"
 #include "database/mainconnector.h"
+#include "engine/usualsign.h"
 #include "views/gridoperations.h"
 #include "views/kpigrid.h"
 #include "views/tabviewbuilder.h"
@@ -21,6 +22,8 @@ private Q_SLOTS:
     void rowTypes_data();
     void rowTypes();
     void headingsAreStyledAndNotNumbered();
+    void barsAreJudgedOnSignedFigures();
+    void everyFigureHasAUsualSign();
     void usersSeeTheirLines_data();
     void usersSeeTheirLines();
     void emptySlotLeavesEveryRowVisible();
@@ -61,6 +64,10 @@ void TestTabViewBuilder::init()
     data.storeFieldValue(62, -3.0, 4);        // hours below zero
     data.storeFieldValue(15, -1234.5, 0);     // money below zero
     data.storeFieldValue(18, 0.0, 0);         // zero money
+    data.storeAccountFigure(17, -300.0, 2);   // consumables account in credit
+    data.storeAccountFigure(22, 0.0, 2);      // paint wages: nothing posted
+    data.storeFieldValue(28, -0.05, 1);       // negative margin, benchmark >30,<20
+    data.storeFieldValue(23, -200.0, 0);      // a loss on paint labour
     m_workspace->prompter().clearMessages();
 }
 
@@ -92,11 +99,21 @@ void TestTabViewBuilder::rowTypes_data()
                                       << true << 1 << u">40%"_s << u"-9%"_s << KpiGrid::Yellow;
     QTest::newRow("percentage without data") << qint64(24) << QString() << KpiGrid::Percentage
                                              << none << true << 1 << u">45%"_s << QString() << none;
-    QTest::newRow("hours below zero") << qint64(62) << u"3"_s << none << KpiGrid::NegativeText
-                                      << true << 0 << QString() << QString() << none;
-    QTest::newRow("money below zero")
-        << qint64(15) << u"$ 1,234.50"_s << none << KpiGrid::NegativeText << true << 0 << QString()
+    QTest::newRow("hours below zero")
+        << qint64(62) << u"-3"_s << KpiGrid::Poor << KpiGrid::NegativeText << true << 0 << QString()
         << QString() << none;
+    QTest::newRow("profit below zero")
+        << qint64(15) << u"$ -1,234.50"_s << KpiGrid::Poor << KpiGrid::NegativeText << true << 0
+        << QString() << QString() << none;
+    QTest::newRow("second loss") << qint64(23) << u"$ -200.00"_s << KpiGrid::Poor
+                                 << KpiGrid::NegativeText << true << 0 << QString() << QString()
+                                 << none;
+    QTest::newRow("cost account in credit") << qint64(17) << u"$ -300.00"_s << KpiGrid::Poor << none
+                                            << false << 0 << QString() << QString() << none;
+    QTest::newRow("account with nothing posted")
+        << qint64(22) << QString() << none << none << false << 0 << QString() << QString() << none;
+    QTest::newRow("negative margin") << qint64(28) << u"-5%"_s << KpiGrid::Poor << none << true << 1
+                                     << u">30%"_s << u"-35%"_s << KpiGrid::Red;
     QTest::newRow("money of zero")
         << qint64(18) << QString() << none << none << false << 0 << QString() << QString() << none;
 }
@@ -183,6 +200,29 @@ void TestTabViewBuilder::usersSeeTheirLines()
     }
 }
 
+void TestTabViewBuilder::barsAreJudgedOnSignedFigures()
+{
+    GridModel grid;
+    build(grid, 2);
+    QMap<qint64, double> values;
+    for (const auto &bar : TabViewBuilder(context(), grid).graphBars(grid))
+        values.insert(bar.fieldId, bar.value);
+    QCOMPARE(values.value(16), 58.3);
+    QCOMPARE(values.value(28), -5.0);
+}
+
+void TestTabViewBuilder::everyFigureHasAUsualSign()
+{
+    RecordSet &fields = context().mainDatabase().fieldsRecordset();
+    QVERIFY(!fields.moveFirst());
+    for (; !fields.eof(); fields.moveNext()) {
+        const qint64 id = fields.value(u"ID"_s).toLongLong();
+        const bool heading = fields.value(u"Type"_s).toInt() == 1;
+        QVERIFY2(heading || UsualSign::of(id) != UsualSign::Unknown,
+                 qPrintable(QString::number(id)));
+    }
+}
+
 void TestTabViewBuilder::emptySlotLeavesEveryRowVisible()
 {
     context().periodDataSet().clearCurrent();
@@ -216,35 +256,60 @@ void TestTabViewBuilder::missingRecordIsReported()
 
 void TestTabViewBuilder::averages_data()
 {
+    QTest::addColumn<qint64>("id");
+    QTest::addColumn<QString>("benchmark");
     QTest::addColumn<QList<double>>("values"); // slots 0 to 2
     QTest::addColumn<int>("type");
     QTest::addColumn<int>("highlighted"); // slot, or -1
     QTest::addColumn<QString>("average");
-    QTest::newRow("highest in slot 1") << QList<double>{0, 5, 5} << 4 << 1 << u"5"_s;
-    QTest::newRow("all zero") << QList<double>{0, 0, 0} << 4 << -1 << QString();
-    QTest::newRow("money") << QList<double>{100, 300, 200} << 5 << 1 << u"$ 200.00"_s;
-    QTest::newRow("percentage") << QList<double>{0.1, 0.2, 0.3} << 3 << 2 << u"20.0%"_s;
-    QTest::newRow("tie keeps the earliest") << QList<double>{7, 7, 1} << 4 << 0 << u"5"_s;
+    QTest::addColumn<QColor>("averageBack");
+    const QColor grey = KpiGrid::AverageBack;
+    QTest::newRow("highest in slot 1")
+        << qint64(500) << QString() << QList<double>{0, 5, 5} << 4 << 1 << u"5"_s << grey;
+    QTest::newRow("all zero") << qint64(500) << QString() << QList<double>{0, 0, 0} << 4 << -1
+                              << QString() << grey;
+    QTest::newRow("money") << qint64(500) << QString() << QList<double>{100, 300, 200} << 5 << 1
+                           << u"$ 200.00"_s << grey;
+    QTest::newRow("percentage") << qint64(500) << QString() << QList<double>{0.1, 0.2, 0.3} << 3
+                                << 2 << u"20.0%"_s << grey;
+    QTest::newRow("tie keeps the earliest")
+        << qint64(500) << QString() << QList<double>{7, 7, 1} << 4 << 0 << u"5"_s << grey;
+    QTest::newRow("a loss month lowers the average profit")
+        << qint64(110) << QString() << QList<double>{-22480.57, 10690.09, 0} << 5 << 1
+        << u"$ -5,895.24"_s << KpiGrid::Poor;
+    QTest::newRow("the smaller cost is the better")
+        << qint64(89) << QString() << QList<double>{-300, -100, -200} << 5 << 1 << u"$ 200.00"_s
+        << grey;
+    QTest::newRow("an at-most share is better lower")
+        << qint64(109) << u"<20,>26"_s << QList<double>{0.25, 0.18, 0.3} << 3 << 1 << u"24.3%"_s
+        << grey;
+    QTest::newRow("an at-least margin is better higher")
+        << qint64(111) << u">8,<4"_s << QList<double>{-0.16, 0.02, 0} << 3 << 1 << u"-7.0%"_s
+        << KpiGrid::Poor;
 }
 
 void TestTabViewBuilder::averages()
 {
+    QFETCH(qint64, id);
+    QFETCH(QString, benchmark);
     QFETCH(QList<double>, values);
     QFETCH(int, type);
     QFETCH(int, highlighted);
     QFETCH(QString, average);
+    QFETCH(QColor, averageBack);
     PeriodDataSet &data = context().periodDataSet();
     GridModel grid;
     for (const QString &key :
          {u"id"_s, u"type"_s, u"data"_s, u"value"_s, u"value1"_s, u"value2"_s, u"average"_s})
         grid.addColumn(key, key, 0, 50, true);
     const int row = grid.addRow();
-    grid.setCellText(row, 1, u"500"_s);
+    grid.setCellText(row, 1, QString::number(id));
     grid.setCellText(row, 2, QString::number(type));
+    grid.setCellText(row, 3, benchmark);
     for (int slot = 0; slot < 3; ++slot) {
         data.setCurrentSlot(quint8(slot));
         data.clearCurrent();
-        data.storeFieldValue(500, values[slot], type == 3 ? 1 : 0);
+        data.storeFieldValue(id, values[slot], type == 3 ? 1 : 0);
     }
     KpiGrid(grid, data, context().mainDatabase(), m_workspace->prompter(), context().numberFormat())
         .computeAverages(2);
@@ -253,7 +318,7 @@ void TestTabViewBuilder::averages()
         QCOMPARE(grid.cell(row, column).back.value_or(QColor()),
                  slot == highlighted ? KpiGrid::Highest : QColor());
     }
-    QCOMPARE(grid.cell(row, 7).back, KpiGrid::AverageBack);
+    QCOMPARE(grid.cell(row, 7).back, averageBack);
     QCOMPARE(grid.cellText(row, 7), average);
     QCOMPARE(data.currentSlot(), quint8(2));
 }
