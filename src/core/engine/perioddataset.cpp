@@ -205,7 +205,9 @@ QString PeriodDataSet::formatFieldValue(double value, int typeCode, bool storage
     case 4:
         return locale.toString(Rounding::halfToEven(value, 0), 'f', 0);
     default:
-        return m_numberFormat.formatMoney(value, true);
+        // Cents rounded as stored amounts are, half away from zero in decimal: an average of
+        // -5,895.235 is -5,895.24, not what its binary neighbour would round to.
+        return m_numberFormat.formatMoney(Rounding::halfAwayFromZero(value, 2), true);
     }
 }
 

@@ -275,7 +275,7 @@ void TestTabViewBuilder::averages_data()
     QTest::newRow("tie keeps the earliest")
         << qint64(500) << QString() << QList<double>{7, 7, 1} << 4 << 0 << u"5"_s << grey;
     QTest::newRow("a loss month lowers the average profit")
-        << qint64(110) << QString() << QList<double>{-22480.57, 10690.09, 0} << 5 << 1
+        << qint64(110) << QString() << QList<double>{-22480.57, 10690.10, 0} << 5 << 1
         << u"$ -5,895.24"_s << KpiGrid::Poor;
     QTest::newRow("the smaller cost is the better")
         << qint64(89) << QString() << QList<double>{-300, -100, -200} << 5 << 1 << u"$ 200.00"_s
