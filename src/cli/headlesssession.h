@@ -27,7 +27,14 @@ struct Options
     QString settingsFile; // empty: the user's own settings
     std::optional<ComparisonRanges::Kind> compareKind;
     int compareCount = 0;
+    bool rememberRange = false; // write the range to the settings, as the window does
 };
+
+// Exit codes of the verbs that produce.
+enum ExitCode { Success = 0, Refused = 2, IncompleteFigures = 3 };
+
+// The environment variable a script may hand the login password in.
+inline constexpr char PasswordVariable[] = "VELTRIX_PASSWORD";
 
 void addOptions(QCommandLineParser &parser);
 // The options, or what is wrong with them.
@@ -46,6 +53,9 @@ public:
     int open(const Options &options);
     // Loads the earlier periods of the options' comparison into slots 1 to N.
     void loadComparison(const Options &options);
+    // Whether the accounting package reported a problem since the login: the figures are not
+    // complete. Says so on standard error.
+    bool figuresIncomplete(const QString &verb) const;
 
     AppContext &context() { return *m_context; }
 
@@ -53,6 +63,7 @@ private:
     std::unique_ptr<ConsolePrompter> m_prompter;
     std::unique_ptr<AppContext> m_context;
     bool m_connected = false;
+    int m_problemsBeforeProduce = 0;
 };
 
 } // namespace HeadlessSession

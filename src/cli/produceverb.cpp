@@ -29,9 +29,9 @@ int usageError(const QString &problem)
 {
     QTextStream err(stderr);
     err << "veltrix-cli produce: " << problem << "\n"
-        << "usage: veltrix-cli produce --from YYYY-MM --to YYYY-MM --user NAME --password PW\n"
-        << "       [--settings FILE] [--compare years|periods --count N] [--format csv|json]"
-        << Qt::endl;
+        << "usage: veltrix-cli produce --from YYYY-MM --to YYYY-MM --user NAME\n"
+        << "       [--password PW | --password-file FILE] [--settings FILE] [--remember]\n"
+        << "       [--compare years|periods --count N] [--format csv|json]" << Qt::endl;
     return 2;
 }
 
@@ -146,8 +146,10 @@ int produce(const QStringList &arguments)
         for (int slot = 1; slot <= options.compareCount; ++slot)
             records += recordsOfSlot(context, slot);
     }
+    if (session.figuresIncomplete(u"produce"_s))
+        return HeadlessSession::IncompleteFigures;
     print(records, format == u"json"_s);
-    return 0;
+    return HeadlessSession::Success;
 }
 
 } // namespace ProduceVerb

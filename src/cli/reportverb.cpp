@@ -143,6 +143,8 @@ int report(const QStringList &arguments)
     ReportView report(context, options, tab);
     KpiTabView &view = report.view();
 
+    if (session.figuresIncomplete(u"report"_s))
+        return HeadlessSession::IncompleteFigures;
     const QString picture = GridReport::graphPicture(context, view);
     if (suffix == u"pdf"_s)
         return writePdf(context, view.grid(), picture, out);

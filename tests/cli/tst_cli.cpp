@@ -6,12 +6,14 @@
 #include "sources/companyfile.h"
 
 #include <QCryptographicHash>
+#include <QDir>
 #include <QImage>
 #include <QJsonArray>
 #include <QJsonDocument>
 #include <QJsonObject>
 #include <QProcess>
 #include <QRegularExpression>
+#include <QSettings>
 #include <QSqlQuery>
 #include <QStandardPaths>
 #include <QTemporaryDir>
@@ -70,6 +72,7 @@ private Q_SLOTS:
     void produceJsonWithComparison();
     void produceRespectsTheUsersLines();
     void produceShowsALossAsALoss();
+    void produceIsHonestAboutItsFigures();
     void produceRefuses_data();
     void produceRefuses();
     void reportPdfShowsTitleGridAndGraph();
@@ -227,6 +230,75 @@ void TestCli::produceRefuses_data()
         << QStringList{u"--from"_s, u"2025-07"_s, u"--to"_s,       u"2025-06"_s,
                        u"--user"_s, u"sysop"_s,   u"--password"_s, u"sysop"_s}
         << u"The selected date range is invalid!"_s;
+    QTest::newRow("year before the first")
+        << QStringList{u"--from"_s, u"1949-12"_s, u"--to"_s,       u"2025-06"_s,
+                       u"--user"_s, u"sysop"_s,   u"--password"_s, u"sysop"_s}
+        << u"in a year from 1950"_s;
+    QTest::newRow("negative year")
+        << QStringList{u"--from"_s, u"-0001-01"_s, u"--to"_s,       u"2025-06"_s,
+                       u"--user"_s, u"sysop"_s,    u"--password"_s, u"sysop"_s}
+        << u"in a year from 1950"_s;
+    QTest::newRow("month 13") << QStringList{u"--from"_s,  u"2025-13"_s, u"--to"_s,
+                                             u"2025-06"_s, u"--user"_s,  u"sysop"_s}
+                              << u"in a year from 1950"_s;
+    QTest::newRow("unreadable password file")
+        << QStringList{u"--from"_s,          u"2025-07"_s,      u"--to"_s,
+                       u"2025-07"_s,         u"--user"_s,       u"sysop"_s,
+                       u"--password-file"_s, u"/no/such/file"_s}
+        << u"cannot read the password file /no/such/file"_s;
+}
+
+void TestCli::produceIsHonestAboutItsFigures()
+{
+    // A copy of the demo whose company file has lost its journal.
+    const QString folder = m_dir.filePath(u"broken"_s);
+    QVERIFY(QDir().mkpath(folder));
+    const QString companyFile = folder + u"/books.myo"_s;
+    QVERIFY(QFile::copy(demoFolder() + u"/Harbour Panel & Paint.myo"_s, companyFile));
+    {
+        SqliteConnection connection;
+        QVERIFY(!connection.open(companyFile));
+        QVERIFY(QSqlQuery(connection.database()).exec(u"DROP TABLE JournalRecords"_s));
+    }
+    const QString settings = folder + u"/settings.ini"_s;
+    QVERIFY(QFile::copy(demoFolder() + u"/settings.ini"_s, settings));
+    QSettings(settings, QSettings::IniFormat)
+        .setValue(u"SOFTWARE/Veltrix/AccFilePath"_s, companyFile);
+    const QStringList arguments{u"produce"_s, u"--settings"_s, settings,     u"--from"_s,
+                                u"2025-07"_s, u"--to"_s,       u"2025-07"_s, u"--user"_s,
+                                u"manager"_s, u"--password"_s, u"manager1"_s};
+    const Run broken = runCli(arguments);
+    QCOMPARE(broken.exitCode, 3);
+    QVERIFY2(broken.err.contains(u"could not be read completely"_s), qPrintable(broken.err));
+    QCOMPARE(broken.out, QString());
+
+    // The range is written to the user's settings only when asked; the password may come from
+    // a file or the environment instead of the command line.
+    QSettings(settings, QSettings::IniFormat)
+        .setValue(u"SOFTWARE/Veltrix/AccFilePath"_s,
+                  demoFolder() + u"/Harbour Panel & Paint.myo"_s);
+    const auto contentOf = [&settings] {
+        QFile file(settings);
+        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
+    };
+    const QByteArray before = contentOf();
+    const QString passwordFile = folder + u"/password"_s;
+    QFile file(passwordFile);
+    QVERIFY(file.open(QIODevice::WriteOnly));
+    file.write("manager1\n");
+    file.close();
+    QStringList fromFile = arguments.mid(0, 9);
+    fromFile << u"--password-file"_s << passwordFile;
+    QCOMPARE(runCli(fromFile).exitCode, 0);
+    QCOMPARE(contentOf(), before);
+    qputenv("VELTRIX_PASSWORD", "manager1");
+    const Run remembered =
+        runCli({u"produce"_s, u"--settings"_s, settings, u"--from"_s, u"2019-03"_s, u"--to"_s,
+                u"2019-03"_s, u"--user"_s, u"manager"_s, u"--remember"_s});
+    qunsetenv("VELTRIX_PASSWORD");
+    QCOMPARE(remembered.exitCode, 0);
+    QCOMPARE(QSettings(settings, QSettings::IniFormat).value(u"SOFTWARE/Veltrix/Y1"_s).toString(),
+             u"2019"_s);
 }
 
 void TestCli::produceRefuses()

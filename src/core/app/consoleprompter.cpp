@@ -5,9 +5,11 @@
 
 using namespace Qt::StringLiterals;
 
-Prompter::Answer ConsolePrompter::message(const QString &text, const QString &title, Icon,
+Prompter::Answer ConsolePrompter::message(const QString &text, const QString &title, Icon icon,
                                           Buttons buttons)
 {
+    if (icon == Icon::Exclamation || icon == Icon::Critical)
+        ++m_problems;
     QTextStream err(stderr);
     const QString trimmedTitle = title.trimmed();
     if (!trimmedTitle.isEmpty())

@@ -14,4 +14,11 @@ public:
     void setNormalPointer() override {}
     QString chooseFile(const QString &, const QString &, const QString &) override { return {}; }
     QString chooseFolder(const QString &, const QString &) override { return {}; }
+
+    // Messages that warned of a problem (an error report, data out of range): a run that saw
+    // one has no complete figures to give.
+    int problemCount() const { return m_problems; }
+
+private:
+    int m_problems = 0;
 };

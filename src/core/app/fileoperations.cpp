@@ -90,8 +90,20 @@ bool copyFile(const QString &source, const QString &target, bool overwrite)
             return false;
         QFile::remove(target);
     }
-    QFile::copy(source, target);
-    return QFileInfo::exists(target);
+    // Written as a new file rather than copied with its source's mode: a database made from a
+    // read-only or world-readable template takes the user's own default permissions (umask).
+    QFile in(source);
+    QFile out(target);
+    if (!in.open(QIODevice::ReadOnly) || !out.open(QIODevice::WriteOnly | QIODevice::NewOnly))
+        return false;
+    while (!in.atEnd()) {
+        const QByteArray chunk = in.read(1 << 16);
+        if (chunk.isEmpty() || out.write(chunk) != chunk.size()) {
+            out.remove();
+            return false;
+        }
+    }
+    return out.flush();
 }
 
 void createEmptyTextFile(const QString &path, bool overwrite)

@@ -48,6 +48,10 @@ QString loadSettings(AppContext &context)
     QDir().mkpath(settings.appFolder);
     FileOperations::folderExists(settings.tempFolder, true);
 
+    // A location the settings cannot hold must not quietly become the program folder, where
+    // a new empty database would be made and used instead of the shop's.
+    if (store.isTooLong(u"DBPath"_s))
+        return DatabasePathTooLong;
     const QString dbPath = store.readSetting(u"DBPath"_s, {}, settings.appFolder);
     settings.accPackage = store.readSetting(u"AccPackage"_s);
     settings.accFilePath = store.readSetting(u"AccFilePath"_s);
@@ -68,10 +72,6 @@ QString loadSettings(AppContext &context)
     if (!FileOperations::fileExists(settings.mainDatabaseFile) &&
         FileOperations::fileExists(settings.newDatabaseFile) &&
         FileOperations::copyFile(settings.newDatabaseFile, settings.mainDatabaseFile, false)) {
-        // An installed template is read-only; the database made from it must not be.
-        QFile::setPermissions(settings.mainDatabaseFile,
-                              QFile::permissions(settings.mainDatabaseFile) |
-                                  QFileDevice::WriteOwner);
         context.prompter().message(u"A new database file has been created!"_s, u"New Database"_s,
                                    Prompter::Icon::Information);
     }

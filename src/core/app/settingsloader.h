@@ -10,3 +10,8 @@ class AppContext;
 // creating it from the template on first use. Returns the message that stops start-up, or
 // empty text when the program may go on.
 QString loadSettings(AppContext &context);
+
+inline const QString DatabasePathTooLong = QStringLiteral(
+    "The database path in your settings is longer than 1000 characters, so it was not used and "
+    "no database was opened or created. Set the database path again in the System "
+    "Configuration.");

@@ -3,6 +3,7 @@
 
 #include "texttrim.h"
 
+#include <QFile>
 #include <QSettings>
 
 using namespace Qt::StringLiterals;
@@ -49,6 +50,15 @@ void SettingsStore::writeSetting(const QString &valueName, const QString &value,
 {
     m_settings->setValue(settingPath(valueName, key), value);
     m_settings->sync();
+#ifdef Q_OS_UNIX
+    QFile::setPermissions(m_settings->fileName(), QFileDevice::ReadOwner | QFileDevice::WriteOwner);
+#endif
+}
+
+bool SettingsStore::isTooLong(const QString &valueName, const QString &key) const
+{
+    m_settings->sync();
+    return m_settings->value(settingPath(valueName, key)).toString().size() > MaxValueLength;
 }
 
 QString SettingsStore::fileName() const

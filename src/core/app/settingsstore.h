@@ -30,7 +30,11 @@ public:
     // result is replaced by the default value.
     QString readSetting(const QString &valueName, const QString &key = {},
                         const QString &defaultValue = {}) const;
+    // Writes and saves at once. On Unix the file is kept for its owner alone: it holds the
+    // enciphered accounting password.
     void writeSetting(const QString &valueName, const QString &value, const QString &key = {});
+    // A value is stored but too long to be used: it reads as empty.
+    bool isTooLong(const QString &valueName, const QString &key = {}) const;
 
     QString fileName() const;
 

@@ -67,13 +67,25 @@ bool RecordOperations::deleteRecordById(RecordSet &records, qint64 id) const
     return true;
 }
 
+QString RecordOperations::likeLiteralClause()
+{
+    return u" LIKE ? ESCAPE '\\'"_s;
+}
+
+QString RecordOperations::likeLiteral(const QString &text)
+{
+    QString literal = text;
+    literal.replace(u'\\', u"\\\\"_s).replace(u'%', u"\\%"_s).replace(u'_', u"\\_"_s);
+    return literal;
+}
+
 std::optional<bool> RecordOperations::valueExists(const QString &table, const QString &column,
                                                   const QString &value, DbError *error) const
 {
     RecordSet records(m_database.database(),
                       u"SELECT "_s + column + u" FROM "_s + table + u" WHERE "_s +
-                          backQuoted(column) + u" LIKE ?"_s,
-                      RecordSet::Access::ReadOnly, {value});
+                          backQuoted(column) + likeLiteralClause(),
+                      RecordSet::Access::ReadOnly, {likeLiteral(value)});
     if (const auto failure = records.open()) {
         if (error)
             *error = *failure;

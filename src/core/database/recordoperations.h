@@ -27,6 +27,10 @@ public:
 
     RecordOperations(MainDatabase &database, Prompter &prompter);
 
+    // " LIKE ? ESCAPE '\'" with the text to bind for it: a case-blind comparison in which
+    // every character of the text stands for itself, wildcards included.
+    static QString likeLiteralClause();
+    static QString likeLiteral(const QString &text);
     // "SELECT * FROM table [WHERE filter]", opened when asked. Values the filter takes from
     // the user go in as bindings for its "?" marks, never into the text.
     Query openQuery(const QString &table, const QString &filter, bool open,
@@ -36,8 +40,8 @@ public:
     bool findRecordById(RecordSet &records, qint64 id) const;
     // Asks first; true when the record is gone afterwards.
     bool deleteRecordById(RecordSet &records, qint64 id) const;
-    // Whether some row's column is LIKE the value: letters in any case, "%" and "_" as
-    // wildcards. The value is bound, so quotes in it are just characters.
+    // Whether some row's column equals the value, letters in any case. The value is bound and
+    // matched literally, so quotes, "%" and "_" in it are just characters.
     std::optional<bool> valueExists(const QString &table, const QString &column,
                                     const QString &value, DbError *error = nullptr) const;
     // Replaces the list with the column of every row, when there are rows; otherwise the list

@@ -26,7 +26,7 @@ QDate ProduceCommand::rangeEnd(const Selection &selection)
     return first.isValid() ? first.addMonths(1).addDays(-1) : QDate();
 }
 
-ProduceCommand::Outcome ProduceCommand::produce(const Selection &selection)
+ProduceCommand::Outcome ProduceCommand::produce(const Selection &selection, Remember remember)
 {
     const Settings &settings = m_context.settings();
     if (!m_context.accountingSource())
@@ -78,6 +78,8 @@ ProduceCommand::Outcome ProduceCommand::produce(const Selection &selection)
     data.setCurrentSlot(0);
     RangeLoader(m_context).loadDateRange(start, end);
 
+    if (remember == Remember::Nothing)
+        return Outcome::Produced;
     SettingsStore &store = m_context.settingsStore();
     store.writeSetting(u"M1"_s, QString::number(selection.firstMonth - 1));
     store.writeSetting(u"M2"_s, QString::number(selection.lastMonth - 1));

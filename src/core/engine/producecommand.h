@@ -23,7 +23,10 @@ public:
 
     explicit ProduceCommand(AppContext &context);
 
-    Outcome produce(const Selection &selection);
+    // The window remembers the range for its next start; a scripted run leaves the user's
+    // settings alone unless asked.
+    enum class Remember { Range, Nothing };
+    Outcome produce(const Selection &selection, Remember remember = Remember::Range);
 
     // The first day of the first month and the last day of the last month.
     static QDate rangeStart(const Selection &selection);

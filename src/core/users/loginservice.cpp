@@ -2,6 +2,7 @@
 #include "loginservice.h"
 
 #include "database/maindatabase.h"
+#include "database/recordoperations.h"
 
 using namespace Qt::StringLiterals;
 
@@ -13,8 +14,11 @@ std::optional<LoginState> checkCredentials(MainDatabase &database, const QString
     if (userName == BuiltInUser && password == BuiltInUser)
         return LoginState{true, BuiltInUser, 1, QString()};
 
-    RecordSet users(database.database(), u"SELECT * FROM Users WHERE `Username` LIKE ?"_s,
-                    RecordSet::Access::ReadOnly, {userName});
+    // The name is matched without regard to case but literally: "manag%" is nobody's name.
+    RecordSet users(database.database(),
+                    u"SELECT * FROM Users WHERE `Username`"_s +
+                        RecordOperations::likeLiteralClause(),
+                    RecordSet::Access::ReadOnly, {RecordOperations::likeLiteral(userName)});
     if (users.open() || users.recordCount() != 1)
         return std::nullopt;
     if (users.value(u"Password"_s).toString() != password)

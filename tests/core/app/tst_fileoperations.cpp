@@ -7,6 +7,10 @@
 #include <QTemporaryDir>
 #include <QTest>
 
+#ifdef Q_OS_UNIX
+#include <sys/stat.h>
+#endif
+
 using namespace Qt::StringLiterals;
 using namespace FileOperations;
 
@@ -151,6 +155,18 @@ void TestFileOperations::copyFileRespectsOverwrite()
 
     // A target in a folder that does not exist cannot be made.
     QVERIFY(!copyFile(path(u"new.db"_s), path(u"nowhere/main.db"_s), true));
+
+#ifdef Q_OS_UNIX
+    // The copy takes the user's umask, not the template's mode: an installed template is
+    // world-readable (or read-only), the shop's database with its passwords must not be.
+    QFile::setPermissions(path(u"new.db"_s),
+                          QFileDevice::ReadOwner | QFileDevice::ReadGroup | QFileDevice::ReadOther);
+    const mode_t saved = ::umask(077);
+    const bool copied = copyFile(path(u"new.db"_s), target, true);
+    ::umask(saved);
+    QVERIFY(copied);
+    QCOMPARE(QFile::permissions(target) & 0x0FFF, QFileDevice::ReadUser | QFileDevice::WriteUser);
+#endif
 }
 
 void TestFileOperations::createEmptyTextFile()

@@ -104,6 +104,9 @@ void TestSettingsLoader::checksInOrder_data()
         << u"<shared>"_s << u"MYOB"_s << u"MYOAU0901"_s << false << DatabaseMissing;
     QTest::newRow("default path is the program folder")
         << QString() << u"MoneyWorks"_s << QString() << false << DatabaseMissing;
+    QTest::newRow("path too long to hold is not replaced by the default")
+        << u"/"_s + QString(1000, u'x') << u"MoneyWorks"_s << QString() << false
+        << DatabasePathTooLong;
 }
 
 void TestSettingsLoader::checksInOrder()

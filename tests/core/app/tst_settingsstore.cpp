@@ -1,6 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "app/settingsstore.h"
 
+#include <QFile>
 #include <QSettings>
 #include <QTemporaryDir>
 #include <QTest>
@@ -101,6 +102,11 @@ void TestSettingsStore::writeReplacesAndPersists()
         store.writeSetting(u"M1"_s, u"11"_s);
     }
     QCOMPARE(SettingsStore(storeFile()).readSetting(u"M1"_s), u"11"_s);
+#ifdef Q_OS_UNIX
+    // It holds the enciphered accounting password.
+    QCOMPARE(QFile::permissions(storeFile()) & 0x0FFF,
+             QFileDevice::ReadUser | QFileDevice::WriteUser);
+#endif
 }
 
 void TestSettingsStore::seesWritesOfAnotherCopy()

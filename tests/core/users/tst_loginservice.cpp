@@ -57,8 +57,10 @@ void TestLoginService::credentials_data()
     QTest::newRow("password is exact") << u"bob"_s << u"secret1"_s << QString() << 0;
     QTest::newRow("apostrophe in the name") << u"o'brien"_s << u"pw"_s << u"O'Brien"_s << 1;
     QTest::newRow("unknown name") << u"carol"_s << u"pw"_s << QString() << 0;
-    QTest::newRow("name matching two users") << u"ann_1"_s << u"x"_s << QString() << 0;
-    QTest::newRow("wildcard typed") << u"b%"_s << u"Secret1"_s << u"bob"_s << 0;
+    QTest::newRow("underscore is a character") << u"ann_1"_s << u"x"_s << u"ann_1"_s << 0;
+    QTest::newRow("underscore matches no other") << u"ann_1"_s << u"y"_s << QString() << 0;
+    QTest::newRow("percent is a character") << u"b%"_s << u"Secret1"_s << QString() << 0;
+    QTest::newRow("backslash is a character") << u"bo\\b"_s << u"Secret1"_s << QString() << 0;
 }
 
 void TestLoginService::credentials()

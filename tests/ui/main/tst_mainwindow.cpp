@@ -132,7 +132,7 @@ void TestMainWindow::failedLogin()
     addUser(*m_workspace, u"ann_1"_s);
     addUser(*m_workspace, u"annA1"_s);
     m_workspace->prompter().clearMessages();
-    window->login(u"ann_1"_s, u"pw"_s); // matches two users
+    window->login(u"ann_1"_s, u"wrong"_s); // "_" is a character: only ann_1's password counts
     QCOMPARE(m_workspace->prompter().messages().size(), 1);
     QCOMPARE(m_workspace->prompter().messages().first().title, u"Login Failed"_s);
     QCOMPARE(m_workspace->prompter().messages().first().text,
