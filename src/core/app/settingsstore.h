@@ -33,6 +33,8 @@ public:
     void writeSetting(const QString &valueName, const QString &value, const QString &key = {});
 
     QString fileName() const;
+    // Writes what is still held in memory to the store now.
+    void sync();
 
 private:
     QString settingPath(const QString &valueName, const QString &key) const;
