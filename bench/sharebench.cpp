@@ -19,6 +19,7 @@
 #include "engine/rangeloader.h"
 #include "setup/hourlyrates.h"
 #include "setup/programsetup.h"
+#include "views/gridoperations.h"
 
 #include <QCoreApplication>
 #include <QDeadlineTimer>
@@ -47,15 +48,6 @@ std::unique_ptr<AppContext> startCopy(const QString &demo, const QString &appFol
     return context;
 }
 
-int rowOf(const GridModel &grid, const QString &id)
-{
-    for (int row = 1; row <= grid.rowCount(); ++row) {
-        if (grid.cellText(row, 1) == id)
-            return row;
-    }
-    return 0;
-}
-
 int writer(const QString &demo, const QString &appFolder, int seconds, int pauseMs)
 {
     RecordingPrompter prompter;
@@ -68,14 +60,16 @@ int writer(const QString &demo, const QString &appFolder, int seconds, int pause
     for (int generation = 1; !deadline.hasExpired(); ++generation) {
         HourlyRates rates(*context);
         rates.load();
-        rates.commitEdit(rowOf(rates.grid(), u"1"_s), QString::number(100 + generation));
-        rates.commitEdit(rowOf(rates.grid(), u"2"_s), QString::number(200 + generation));
+        rates.commitEdit(GridOperations::findGridRow(rates.grid(), 1, u"1"_s),
+                         QString::number(100 + generation));
+        rates.commitEdit(GridOperations::findGridRow(rates.grid(), 1, u"2"_s),
+                         QString::number(200 + generation));
         failures += rates.save() ? 0 : 1;
 
         ProgramSetup setup(*context);
         setup.load();
         GridModel &mapping = setup.grid(ProgramSetup::Mapping);
-        const int row = rowOf(mapping, u"13"_s);
+        const int row = GridOperations::findGridRow(mapping, 1, u"13"_s);
         QString codes = mapping.cellText(row, ProgramSetup::DataColumn);
         codes.remove(QRegularExpression(u"\\+ZZ\\d+$"_s));
         setup.commitEdit(ProgramSetup::Mapping, row,

@@ -157,7 +157,7 @@ QString SimulatorServer::evaluate(const QString &expression)
 namespace {
 
 // A format template filled in for one record: every [Field] becomes the record's value of that
-// field, named in any case; \t, \n and \r stand for their characters; the rest is copied.
+// field, named in any case; the rest is copied as it is.
 std::optional<QString> fillTemplate(const QString &format, const QHash<QString, QString> &record)
 {
     QString text;
@@ -172,10 +172,6 @@ std::optional<QString> fillTemplate(const QString &format, const QHash<QString, 
                 return std::nullopt;
             text += *value;
             i = close;
-        } else if (c == u'\\' && i + 1 < format.size() &&
-                   QStringView(u"tnr").contains(format[i + 1])) {
-            const QChar escaped = format[++i];
-            text += escaped == u't' ? u'\t' : escaped == u'n' ? u'\n' : u'\r';
         } else {
             text += c;
         }

@@ -230,15 +230,10 @@ void TestMoneyWorksSource::serverAnswersAsDocumented_data()
                                                       u"and transdate <= '2/7/25'"_s);
     QTest::newRow("version, no login needed")
         << QByteArray("/REST//version") << false << QByteArray("200 OK\r\n9.2");
-    QTest::newRow("evaluate needs a login")
-        << document + "/evaluate/expr=DocumentPath" << false << QByteArray("401 Unauthorized");
     QTest::newRow("export through a template: records only, ended as the template ends them")
         << document + "/export/table=transaction&search=" + search +
                "&format=%5BTheirRef%5D%3B%5BDetail.Account%5D%0A"
         << true << QByteArray("200 OK\r\nRO2;4-1100\nRO2;4-1400\n");
-    QTest::newRow("template escapes") << document + "/export/table=transaction&search=" + search +
-                                             "&format=%5BTheirRef%5D%5Ct%5BType%5D%5Cr%5Cn"
-                                      << true << QByteArray("200 OK\r\nRO2\tDI\r\nRO2\tDI\r\n");
     QTest::newRow("export without a template")
         << document + "/export/table=transaction&search=" + search << true
         << QByteArray("400 Bad Request");

@@ -46,8 +46,7 @@ private Q_SLOTS:
     void clockFormat();
     void typeAheadCompletesNames();
     void twoWindowsCountToTwoAndBack();
-    void shutdownRequestEndsTheProgram_data();
-    void shutdownRequestEndsTheProgram();
+    void shutdownRequestEndsTheProgramUnderADialog();
     void logoffRequestIsWithdrawnWhileItsBoxIsOpen();
     void produceShowsTheDemoFigures();
     void setupMenuFollowsTheUser_data();
@@ -273,16 +272,8 @@ void TestMainWindow::twoWindowsCountToTwoAndBack()
              u"0"_s);
 }
 
-void TestMainWindow::shutdownRequestEndsTheProgram_data()
+void TestMainWindow::shutdownRequestEndsTheProgramUnderADialog()
 {
-    QTest::addColumn<bool>("dialogOpen");
-    QTest::newRow("no dialog open") << false;
-    QTest::newRow("a dialog open") << true;
-}
-
-void TestMainWindow::shutdownRequestEndsTheProgram()
-{
-    QFETCH(bool, dialogOpen);
     auto window = openWindow(*m_workspace);
     QVERIFY(window);
     window->show();
@@ -296,14 +287,10 @@ void TestMainWindow::shutdownRequestEndsTheProgram()
     QCOMPARE(ConfigValues(m_workspace->context().mainDatabase(), m_workspace->prompter())
                  .setConfigValue(5, u"Shutdown"_s),
              std::nullopt);
-    if (dialogOpen) {
-        // The poll comes while the dialog runs its own event loop.
-        QTimer::singleShot(0, window.get(), &MainWindow::pollUsers);
-        QTimer::singleShot(10000, &dialog, &QDialog::reject);
-        dialog.exec();
-    } else {
-        window->pollUsers();
-    }
+    // The poll comes while the dialog runs its own event loop.
+    QTimer::singleShot(0, window.get(), &MainWindow::pollUsers);
+    QTimer::singleShot(10000, &dialog, &QDialog::reject);
+    dialog.exec();
     QVERIFY(ended);
     QVERIFY(!window->isVisible());
     // Shut down in order: the database is closed.
