@@ -5,6 +5,7 @@
 #include "app/prompter.h"
 #include "app/qtprompter.h"
 #include "app/settingsstore.h"
+#include "app/shutdown.h"
 #include "main/mainwindow.h"
 
 #include <QApplication>
@@ -28,6 +29,7 @@ int main(int argc, char *argv[])
     std::unique_ptr<MainWindow> mainWindow;
     QObject::connect(loading, &LoadingWindow::startupSucceeded, &app, [&] {
         mainWindow = std::make_unique<MainWindow>(context, prompter);
+        mainWindow->setProgramEnd([&context] { endProgramNow(context); });
         prompter.setParentWindow(mainWindow.get());
         mainWindow->show();
     });

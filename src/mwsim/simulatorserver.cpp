@@ -76,6 +76,15 @@ QByteArray SimulatorServer::respond(const QByteArray &request)
     if (requestLine.size() < 2 || requestLine[0] != "GET")
         return httpResponse(405, "Method Not Allowed", "GET only\n");
 
+    // /REST/<document>/<command>/<parameters>
+    const QByteArray target = requestLine[1];
+    if (!target.startsWith("/REST/"))
+        return httpResponse(404, "Not Found", "No such resource\n");
+    const QList<QByteArray> parts = target.mid(6).split('/');
+    // The server's version is told to anyone, logged in or not.
+    if (parts.size() >= 2 && (parts[0].isEmpty() || parts[0] == "server") && parts[1] == "version")
+        return httpResponse(200, "OK", "9.2");
+
     if (!m_options.user.isEmpty()) {
         const QByteArray expected =
             "Basic " + (m_options.user + u':' + m_options.password).toUtf8().toBase64();
@@ -87,14 +96,6 @@ QByteArray SimulatorServer::respond(const QByteArray &request)
         if (!authorised)
             return httpResponse(401, "Unauthorized", "Login required\n");
     }
-
-    // /REST/<document>/<command>/<parameters>
-    const QByteArray target = requestLine[1];
-    if (!target.startsWith("/REST/"))
-        return httpResponse(404, "Not Found", "No such resource\n");
-    const QList<QByteArray> parts = target.mid(6).split('/');
-    if (parts.size() >= 2 && parts[0].isEmpty() && parts[1] == "version")
-        return httpResponse(200, "OK", "9.2");
     if (parts.size() < 3)
         return httpResponse(404, "Not Found", "No such resource\n");
     const QString document = QUrl::fromPercentEncoding(parts[0]);
@@ -112,8 +113,13 @@ QByteArray SimulatorServer::respond(const QByteArray &request)
     }
     if (command == "evaluate")
         return httpResponse(200, "OK", evaluate(values.value(u"expr"_s)).toUtf8());
-    if (command == "export" && values.value(u"table"_s).toLower() == u"transaction"_s)
-        return httpResponse(200, "OK", exportInvoices(values.value(u"search"_s)).toUtf8());
+    if (command == "export" && values.value(u"table"_s).toLower() == u"transaction"_s) {
+        const std::optional<QString> records =
+            exportInvoices(values.value(u"search"_s), values.value(u"format"_s));
+        if (!records)
+            return httpResponse(400, "Bad Request", "Unsupported export format\n");
+        return httpResponse(200, "OK", records->toUtf8());
+    }
     return httpResponse(400, "Bad Request", "Unsupported command\n");
 }
 
@@ -148,25 +154,67 @@ QString SimulatorServer::evaluate(const QString &expression)
     return QString::number(Rounding::halfAwayFromZero(total, 2), 'f', 2);
 }
 
-QString SimulatorServer::exportInvoices(const QString &search)
+namespace {
+
+// A format template filled in for one record: every [Field] becomes the record's value of that
+// field, named in any case; the rest is copied as it is.
+std::optional<QString> fillTemplate(const QString &format, const QHash<QString, QString> &record)
 {
+    QString text;
+    for (qsizetype i = 0; i < format.size(); ++i) {
+        const QChar c = format[i];
+        if (c == u'[') {
+            const qsizetype close = format.indexOf(u']', i);
+            if (close < 0)
+                return std::nullopt;
+            const auto value = record.constFind(format.mid(i + 1, close - i - 1).toLower());
+            if (value == record.cend())
+                return std::nullopt;
+            text += *value;
+            i = close;
+        } else {
+            text += c;
+        }
+    }
+    return text;
+}
+
+} // namespace
+
+std::optional<QString> SimulatorServer::exportInvoices(const QString &search, const QString &format)
+{
+    // Only templates are served; MoneyWorks' own XML forms are not needed by Veltrix.
+    if (!format.contains(u'['))
+        return std::nullopt;
     static const QRegularExpression invoices(
         uR"(^type = `DI@` and transdate >= '([^']*)' and transdate <= '([^']*)'$)"_s);
     const QRegularExpressionMatch match = invoices.match(search);
-    QString text = u"theirref\tu.detail.account\r\n"_s;
+    QString text;
     if (!match.hasMatch())
         return text;
     const QDate from = ShortDate::parse(match.captured(1), m_locale);
     const QDate to = ShortDate::parse(match.captured(2), m_locale);
     QSqlQuery query(m_ledger.database());
-    query.prepare(u"SELECT InvoiceNumber FROM Sales WHERE Date BETWEEN ? AND ? ORDER BY Date"_s);
+    query.prepare(
+        u"SELECT InvoiceNumber, Date FROM Sales WHERE Date BETWEEN ? AND ? ORDER BY Date"_s);
     query.addBindValue(from.toString(Qt::ISODate));
     query.addBindValue(to.toString(Qt::ISODate));
-    if (query.exec()) {
-        // Every invoice has its labour and its parts line; both carry the reference.
-        while (query.next()) {
-            const QString reference = query.value(0).toString();
-            text += reference + u"\t4-1100\r\n"_s + reference + u"\t4-1400\r\n"_s;
+    if (!query.exec())
+        return text;
+    // Every invoice has its labour and its parts line; both carry the reference.
+    while (query.next()) {
+        const QString reference = query.value(0).toString();
+        const QString date =
+            ShortDate::format(QDate::fromString(query.value(1).toString(), Qt::ISODate), m_locale);
+        for (const QString &account : {u"4-1100"_s, u"4-1400"_s}) {
+            const QHash<QString, QString> record{{u"theirref"_s, reference},
+                                                 {u"transdate"_s, date},
+                                                 {u"type"_s, u"DI"_s},
+                                                 {u"detail.account"_s, account}};
+            const std::optional<QString> line = fillTemplate(format, record);
+            if (!line)
+                return std::nullopt;
+            text += *line;
         }
     }
     return text;

@@ -8,9 +8,12 @@
 #include <QTcpServer>
 
 // A stand-in for a MoneyWorks Datacentre REST server that serves one ledger, a company file,
-// as one document. It understands exactly what Veltrix sends: "DocumentPath",
-// "periodtodate(currentperiod())", the GetMovement expression and the export of debtor
-// invoices for the jobs count. Any other expression gets MoneyWorks' error text.
+// as one document, answering as the published REST interface does: "version" without a login,
+// "evaluate" with the expression's value as plain text, and "export" of transactions through a
+// format template, which gives each record the template's text with its fields filled in and
+// nothing else (no line of column names). It understands exactly what Veltrix sends:
+// "DocumentPath", "periodtodate(currentperiod())", the GetMovement expression and the search
+// for debtor invoices of the jobs count; any other expression gets MoneyWorks' error text.
 class SimulatorServer : public QObject
 {
     Q_OBJECT
@@ -35,8 +38,9 @@ public:
 
     // The answer to one evaluate request.
     QString evaluate(const QString &expression);
-    // The answer to the jobs export.
-    QString exportInvoices(const QString &search);
+    // The answer to an export of invoice lines through a format template; nothing when the
+    // template names a field the simulator does not keep.
+    std::optional<QString> exportInvoices(const QString &search, const QString &format);
 
 private:
     void serve(QTcpSocket *socket);

@@ -25,6 +25,8 @@ Prompter::Answer RecordingPrompter::message(const QString &text, const QString &
 {
     const Answer answer = m_answers.isEmpty() ? defaultAnswer(buttons) : m_answers.dequeue();
     m_messages.append({text, title, icon, buttons, answer});
+    if (m_whileShown)
+        m_whileShown(m_messages.last());
     return answer;
 }
 

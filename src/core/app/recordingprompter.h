@@ -6,6 +6,8 @@
 #include <QList>
 #include <QQueue>
 
+#include <functional>
+
 // A prompter without a display: it records every message and pointer change and answers from
 // a script. With no scripted answer left it takes the first button (OK or Yes), as pressing
 // Enter would.
@@ -31,6 +33,11 @@ public:
 
     void scriptAnswer(Answer answer) { m_answers.enqueue(answer); }
     void scriptChosenPath(const QString &path) { m_paths.enqueue(path); }
+    // Runs while a message is shown, as a real box runs its own event loop until it closes.
+    void setWhileShown(std::function<void(const Message &)> action)
+    {
+        m_whileShown = std::move(action);
+    }
 
     const QList<Message> &messages() const { return m_messages; }
     void clearMessages() { m_messages.clear(); }
@@ -43,5 +50,6 @@ private:
     QQueue<Answer> m_answers;
     QQueue<QString> m_paths;
     QList<bool> m_pointerChanges;
+    std::function<void(const Message &)> m_whileShown;
     bool m_busy = false;
 };

@@ -65,3 +65,8 @@ QString SettingsStore::fileName() const
 {
     return m_settings->fileName();
 }
+
+void SettingsStore::sync()
+{
+    m_settings->sync();
+}

@@ -37,6 +37,8 @@ public:
     bool isTooLong(const QString &valueName, const QString &key = {}) const;
 
     QString fileName() const;
+    // Writes what is still held in memory to the store now.
+    void sync();
 
 private:
     QString settingPath(const QString &valueName, const QString &key) const;

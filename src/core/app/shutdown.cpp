@@ -3,16 +3,20 @@
 
 #include "appcontext.h"
 #include "fileoperations.h"
+#include "settingsstore.h"
 
 #include "database/mainconnector.h"
 #include "engine/cachefile.h"
 #include "users/loginsession.h"
 #include "web/webpageopener.h"
 
+#include <cstdlib>
+
 void shutDown(AppContext &context)
 {
     const PeriodDataSet::Slot &slot0 = context.periodDataSet().slot(0);
-    if (!slot0.isEmpty() && !context.settings().cacheFile.isEmpty())
+    if (!slot0.isEmpty() && !context.periodDataSet().isFilling(0) &&
+        !context.settings().cacheFile.isEmpty())
         CacheFile::write(context.settings().cacheFile, slot0);
 
     if (context.loginState().loggedIn && context.mainDatabase().isConnected())
@@ -23,4 +27,10 @@ void shutDown(AppContext &context)
 
     if (!context.settings().tempFolder.isEmpty())
         FileOperations::clearFolder(context.settings().tempFolder);
+}
+
+void endProgramNow(AppContext &context)
+{
+    context.settingsStore().sync();
+    std::_Exit(0);
 }

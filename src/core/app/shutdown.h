@@ -8,3 +8,6 @@ class AppContext;
 // temporary folder. No step's failure stops the ones after it. Ending the process is left to
 // the caller.
 void shutDown(AppContext &context);
+// After shutDown: flushes the settings and ends the process there and then, so that no
+// dialog or window still open gets another event over a closed database.
+[[noreturn]] void endProgramNow(AppContext &context);

@@ -1,6 +1,10 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "maindatabase.h"
 
+#include "databasetransaction.h"
+
+#include <vector>
+
 using namespace Qt::StringLiterals;
 
 std::optional<DbError> MainDatabase::openStandingRecordsets()
@@ -36,6 +40,34 @@ void MainDatabase::requeryFields()
     m_fields.requery();
     for (RecordSet &tab : m_tabs)
         tab.requery();
+}
+
+std::optional<DbError> MainDatabase::rereadForProduce()
+{
+    // Fresh copies are read and only put in place once all of them are, so that a failure
+    // leaves what the views show untouched. Record sets never opened stay so.
+    std::vector<std::pair<RecordSet *, RecordSet>> fresh;
+    for (RecordSet *standing : {&m_hours, &m_fields}) {
+        if (!standing->sql().isEmpty())
+            fresh.emplace_back(standing, RecordSet(database(), standing->sql()));
+    }
+    for (RecordSet &tab : m_tabs) {
+        if (!tab.sql().isEmpty())
+            fresh.emplace_back(&tab, RecordSet(database(), tab.sql(), RecordSet::Access::ReadOnly));
+    }
+
+    DatabaseTransaction snapshot(database(), DatabaseTransaction::Kind::Read);
+    if (snapshot.beginError())
+        return snapshot.beginError();
+    for (auto &[standing, copy] : fresh) {
+        if (const auto error = copy.open())
+            return error;
+    }
+    if (const auto error = snapshot.commit())
+        return error;
+    for (auto &[standing, copy] : fresh)
+        *standing = std::move(copy);
+    return std::nullopt;
 }
 
 void MainDatabase::close()

@@ -33,6 +33,10 @@ public:
     std::optional<DbError> openTabRecordsets();
     // After the Fields table changed, so that every view sees the change.
     void requeryFields();
+    // Reads Hours, Fields and the tabs again, all from one state of the file, so that a
+    // produce sees every change another copy saved and never half of one. On failure the
+    // record sets stay as they were.
+    std::optional<DbError> rereadForProduce();
     void close();
 
 private:

@@ -75,6 +75,9 @@ public:
     Slot &current() { return m_slots.at(m_current); }
     const Slot &current() const { return m_slots.at(m_current); }
     void clearCurrent() { current() = Slot(); }
+    // A slot the loader is filling holds only part of a load: it is never kept as the cache.
+    bool isFilling(int slot) const { return m_filling.at(slot); }
+    void setFilling(int slot, bool filling) { m_filling.at(slot) = filling; }
 
     Range range(int slot) const { return m_ranges.at(slot); }
     void setRange(int slot, const Range &range) { m_ranges.at(slot) = range; }
@@ -107,5 +110,6 @@ private:
     const NumberFormat &m_numberFormat;
     std::array<Slot, SlotCount> m_slots;
     std::array<Range, SlotCount> m_ranges;
+    std::array<bool, SlotCount> m_filling{};
     quint8 m_current = 0;
 };

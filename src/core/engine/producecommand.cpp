@@ -28,6 +28,7 @@ QDate ProduceCommand::rangeEnd(const Selection &selection)
 
 ProduceCommand::Outcome ProduceCommand::produce(const Selection &selection, Remember remember)
 {
+    const AppContext::BusyScope busy(m_context);
     const Settings &settings = m_context.settings();
     if (!m_context.accountingSource())
         m_context.setAccountingSource(
@@ -75,6 +76,12 @@ ProduceCommand::Outcome ProduceCommand::produce(const Selection &selection, Reme
         return Outcome::InvalidRange;
     }
 
+    // Another copy may have changed the rates or the Fields since this one last read them.
+    if (const auto error = m_context.mainDatabase().rereadForProduce()) {
+        ErrorReporter(m_context.prompter())
+            .reportError(error->number, error->description, u"Produce"_s);
+        return Outcome::Failed;
+    }
     data.setCurrentSlot(0);
     RangeLoader(m_context).loadDateRange(start, end);
 

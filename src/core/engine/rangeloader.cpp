@@ -45,18 +45,23 @@ void RangeLoader::loadSlot(int slot, const QDate &start, const QDate &end)
 
 void RangeLoader::loadDateRange(const QDate &start, const QDate &end)
 {
-    const BusyPointer busy(m_context.prompter());
+    const BusyPointer busyPointer(m_context.prompter());
+    const AppContext::BusyScope busy(m_context);
     const int daySpan = int(start.daysTo(end));
     const int working = workingDays(start, end);
     const bool beyondPeriod = outOfRange(start, end);
 
-    m_context.periodDataSet().clearCurrent();
+    PeriodDataSet &data = m_context.periodDataSet();
+    const int slot = data.currentSlot();
+    data.clearCurrent();
+    data.setFilling(slot, true);
     if (!beyondPeriod)
         loadAccountFigures(start, end);
 
     AccountingSource *source = m_context.accountingSource();
     const int jobs = source ? source->jobsCount(start, end) : 0;
     computeFormulas(daySpan, working, jobs);
+    data.setFilling(slot, false);
 }
 
 bool RangeLoader::outOfRange(const QDate &start, const QDate &end)
@@ -89,7 +94,8 @@ void RangeLoader::loadAccountFigures(const QDate &start, const QDate &end)
         return;
     AccountingSource *source = m_context.accountingSource();
     PeriodDataSet &data = m_context.periodDataSet();
-    for (; !fields.eof(); fields.moveNext()) {
+    // A record set closed under the load (a disconnect) has no current record: the loop ends.
+    for (; fields.hasCurrentRecord(); fields.moveNext()) {
         const int type = fields.value(u"Type"_s).toInt();
         if (type != 2)
             continue;

@@ -63,10 +63,13 @@ bool HourlyRates::save()
 {
     MainDatabase &database = m_context.mainDatabase();
     const NumberFormat &numbers = m_context.numberFormat();
-    const bool saved = m_list.saveInto(
-        m_context, database.hoursRecordset(), u"Hours"_s, u"Value"_s,
-        [&numbers](const QString &text) { return QVariant(numbers.toNumber(text)); },
-        u"Save Labour Hours"_s);
+    const QString errorContext = u"Save Labour Hours"_s;
+    const bool saved = SetupList::saveTogether(m_context, errorContext, [&] {
+        return m_list.saveInto(
+            m_context, database.hoursRecordset(), u"Hours"_s, u"Value"_s,
+            [&numbers](const QString &text) { return QVariant(numbers.toNumber(text)); },
+            errorContext);
+    });
     database.hoursRecordset().requery();
     return saved;
 }

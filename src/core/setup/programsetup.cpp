@@ -72,10 +72,12 @@ bool ProgramSetup::save()
     MainDatabase &database = m_context.mainDatabase();
     const auto asText = [](const QString &text) { return QVariant(text); };
     const QString context = u"Save Program Setup"_s;
-    const bool saved = m_mappingList.saveInto(m_context, database.fieldsRecordset(), u"Fields"_s,
-                                              u"Data"_s, asText, context) &&
-                       m_benchmarkList.saveInto(m_context, database.fieldsRecordset(), u"Fields"_s,
-                                                u"Data"_s, asText, context);
+    const bool saved = SetupList::saveTogether(m_context, context, [&] {
+        return m_mappingList.saveInto(m_context, database.fieldsRecordset(), u"Fields"_s, u"Data"_s,
+                                      asText, context) &&
+               m_benchmarkList.saveInto(m_context, database.fieldsRecordset(), u"Fields"_s,
+                                        u"Data"_s, asText, context);
+    });
     database.requeryFields();
     return saved;
 }

@@ -3,6 +3,7 @@
 
 #include "app/appcontext.h"
 #include "app/errorreporter.h"
+#include "database/databasetransaction.h"
 #include "database/maindatabase.h"
 #include "database/recordoperations.h"
 
@@ -61,4 +62,18 @@ bool SetupList::saveInto(AppContext &context, RecordSet &records, const QString 
         return false;
     }
     return true;
+}
+
+bool SetupList::saveTogether(AppContext &context, const QString &errorContext,
+                             const std::function<bool()> &saves)
+{
+    DatabaseTransaction transaction(context.mainDatabase().database(),
+                                    DatabaseTransaction::Kind::Write);
+    const bool saved = !transaction.beginError() && saves();
+    if (const std::optional<DbError> failure = transaction.commit()) {
+        ErrorReporter(context.prompter())
+            .reportError(failure->number, failure->description, errorContext);
+        return false;
+    }
+    return saved;
 }

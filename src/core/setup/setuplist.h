@@ -41,6 +41,12 @@ public:
                   const QString &field, const Conversion &conversion,
                   const QString &errorContext) const;
 
+    // Runs the saves in one transaction, so that another copy reads all of their changes or
+    // none. Rows written before a failure stay written, as they would one by one. False when
+    // a save or the transaction failed; every failure is reported under the error context.
+    static bool saveTogether(AppContext &context, const QString &errorContext,
+                             const std::function<bool()> &saves);
+
 private:
     GridModel &m_grid;
     Columns m_columns;

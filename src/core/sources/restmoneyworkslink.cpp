@@ -61,13 +61,22 @@ std::optional<DbError> RestMoneyWorksLink::exportRecords(const QString &sortFiel
                                                          const QString &search,
                                                          const QString &outputFile)
 {
+    // The server fills the template in once per record and adds nothing: no line of column
+    // names, each line ended as the template ends it. The jobs file is read as a header line
+    // and records, lines ended by CR LF, so it is written in that form.
     const Answer answer = get(u"export"_s, u"table=transaction&search="_s + encoded(search) +
                                                u"&sort="_s + encoded(sortField) + u"&format="_s +
                                                encoded(u"[TheirRef]\t[Detail.Account]\n"_s));
     if (answer.error)
         return answer.error;
+    QStringList lines{u"theirref\tu.detail.account"_s};
+    for (const QString &line : answer.text.split(u'\n', Qt::SkipEmptyParts)) {
+        const QString record = line.endsWith(u'\r') ? line.chopped(1) : line;
+        if (!record.isEmpty())
+            lines << record;
+    }
     QSaveFile file(outputFile);
-    const QByteArray bytes = answer.text.toUtf8();
+    const QByteArray bytes = (lines.join(u"\r\n"_s) + u"\r\n"_s).toUtf8();
     if (!file.open(QIODevice::WriteOnly) || file.write(bytes) != bytes.size() || !file.commit())
         return DbError{75, u"Cannot write %1: %2"_s.arg(outputFile, file.errorString())};
     return std::nullopt;

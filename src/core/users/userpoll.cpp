@@ -5,24 +5,30 @@
 
 using namespace Qt::StringLiterals;
 
-UserPoll::Result UserPoll::tick(const ConfigValues &config)
+UserPoll::Result UserPoll::tick(const ConfigValues &config, bool busy)
 {
     Result result;
     result.activeUsers = config.getConfigValue(ConfigValues::UserCount);
     const QString request = config.getConfigValue(ConfigValues::NetworkRequest);
-    if (request.isEmpty())
-        return result;
-    if (request != m_lastRequest) {
+    if (!request.isEmpty() && request != m_lastRequest) {
         m_lastRequest = request;
+        Action action = Action::None;
         if (request == u"Logoff"_s)
-            result.action = Action::Logoff;
+            action = Action::Logoff;
         else if (request == u"Shutdown"_s)
-            result.action = Action::Shutdown;
+            action = Action::Shutdown;
         else if (request == u"Disconnect"_s)
-            result.action = Action::Disconnect;
-        return result;
+            action = Action::Disconnect;
+        // A shutdown held back for a load outranks whatever request follows it.
+        if (action != Action::None && m_pending != Action::Shutdown)
+            m_pending = action;
+    } else if (!request.isEmpty()) {
+        m_lastRequest.clear();
+        config.setConfigValue(ConfigValues::NetworkRequest, QString());
     }
-    m_lastRequest.clear();
-    config.setConfigValue(ConfigValues::NetworkRequest, QString());
+    if (!busy) {
+        result.action = m_pending;
+        m_pending = Action::None;
+    }
     return result;
 }

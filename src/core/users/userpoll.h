@@ -21,9 +21,12 @@ public:
 
     static constexpr int IntervalMs = 3000;
 
-    Result tick(const ConfigValues &config);
+    // While the copy is busy (a load waits for its source) the request is still taken in and
+    // withdrawn on time, but its action is held back and given by the first tick after.
+    Result tick(const ConfigValues &config, bool busy = false);
     QString lastRequest() const { return m_lastRequest; }
 
 private:
     QString m_lastRequest;
+    Action m_pending = Action::None;
 };

@@ -32,6 +32,7 @@
 #include <QCloseEvent>
 #include <QComboBox>
 #include <QCompleter>
+#include <QCoreApplication>
 #include <QFocusEvent>
 #include <QFormLayout>
 #include <QGridLayout>
@@ -52,6 +53,7 @@ MainWindow::MainWindow(AppContext &context, Prompter &prompter, QWidget *parent)
     : QMainWindow(parent)
     , m_context(context)
     , m_prompter(prompter)
+    , m_endProgram([] { QCoreApplication::exit(0); })
 {
     setObjectName(u"frmMain"_s);
     setWindowTitle(u"Veltrix"_s);
@@ -434,29 +436,38 @@ void MainWindow::pollUsers()
 {
     if (!m_context.mainDatabase().isConnected())
         return;
-    const UserPoll::Result result = m_poll.tick(ConfigValues(m_context.mainDatabase(), m_prompter));
+    const UserPoll::Result result =
+        m_poll.tick(ConfigValues(m_context.mainDatabase(), m_prompter), m_context.isBusy());
     m_lblActiveUsers->setText(result.activeUsers + u" users are logged in"_s);
     switch (result.action) {
     case UserPoll::Action::Logoff:
         logoff(true);
-        m_prompter.message(u"You have been logged off due to a network request that requires "
-                           u"all users to logoff!"_s,
-                           u"Network Request"_s, Prompter::Icon::Information);
+        tellLater(u"You have been logged off due to a network request that requires all users "
+                  u"to logoff!"_s);
         break;
     case UserPoll::Action::Shutdown:
         close();
+        m_endProgram();
         break;
     case UserPoll::Action::Disconnect:
         logoff(true);
         m_picLogin->hide();
         disconnectMainDatabase(m_context);
-        m_prompter.message(u"You have been disconnected due to a network request that requires "
-                           u"all users to disconnect from the database!"_s,
-                           u"Network Request"_s, Prompter::Icon::Information);
+        tellLater(u"You have been disconnected due to a network request that requires all users "
+                  u"to disconnect from the database!"_s);
         break;
     case UserPoll::Action::None:
         break;
     }
+}
+
+void MainWindow::tellLater(const QString &text)
+{
+    // Not from inside the poll: a timer does not fire again while its own slot runs, so a box
+    // opened here would stop this copy's poll, and the withdrawal of the request, until OK.
+    QTimer::singleShot(0, this, [this, text] {
+        m_prompter.message(text, u"Network Request"_s, Prompter::Icon::Information);
+    });
 }
 
 void MainWindow::resetUserCounter()

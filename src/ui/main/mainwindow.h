@@ -41,6 +41,9 @@ public:
     void stepFollowingYear();
     void pollUsers();
     void resetUserCounter();
+    // What ends the program after a "Shutdown" request has shut it down in order; by
+    // default the event loops are left.
+    void setProgramEnd(std::function<void()> end) { m_endProgram = std::move(end); }
     void selectTab(int tab);
 
     // The controls, by the names the rest of the program knows them.
@@ -83,6 +86,7 @@ private:
     void step(const std::function<
               std::optional<ProduceCommand::Selection>(const ProduceCommand::Selection &)> &next);
     void updateClock();
+    void tellLater(const QString &text);
 
     AppContext &m_context;
     Prompter &m_prompter;
@@ -116,4 +120,5 @@ private:
     QTimer *m_tmrUsers = nullptr;
     QTimer *m_tmrDT = nullptr;
     bool m_shutDown = false;
+    std::function<void()> m_endProgram;
 };

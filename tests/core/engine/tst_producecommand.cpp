@@ -4,12 +4,62 @@
 #include "app/settingsloader.h"
 #include "database/mainconnector.h"
 #include "engine/producecommand.h"
+#include "engine/rangeloader.h"
+#include "setup/hourlyrates.h"
+#include "setup/programsetup.h"
 #include "sources/accountingsource.h"
 #include "sources/companyfilewriter.h"
+#include "views/gridoperations.h"
 
 #include <QTest>
 
+#include <sqlite3.h>
+
 using namespace Qt::StringLiterals;
+
+namespace {
+
+// Another copy of the program on the same main.db, with its setup lists open: panel labour
+// at $50 an hour, and its sales taken from an account that never moved.
+class OtherCopy
+{
+public:
+    explicit OtherCopy(const QString &sharedFolder)
+    {
+        m_ready = m_workspace.configure(u"MYOB"_s);
+        m_workspace.store().writeSetting(u"DBPath"_s, sharedFolder);
+        m_ready = m_ready && loadSettings(m_workspace.context()).isEmpty() &&
+                  connectMainDatabase(m_workspace.context()).isEmpty();
+        m_rates.load();
+        m_setup.load();
+        m_rates.commitEdit(GridOperations::findGridRow(m_rates.grid(), 1, u"1"_s), u"50"_s);
+        m_setup.commitEdit(
+            ProgramSetup::Mapping,
+            GridOperations::findGridRow(m_setup.grid(ProgramSetup::Mapping), 1, u"13"_s),
+            u"9-9999"_s);
+    }
+    bool isReady() const { return m_ready; }
+    sqlite3 *handle() { return m_workspace.context().mainDatabase().connection().handle(); }
+    bool saveRate() { return m_rates.save(); }
+    bool saveMapping() { return m_setup.save(); }
+
+private:
+    TestWorkspace m_workspace;
+    HourlyRates m_rates{m_workspace.context()};
+    ProgramSetup m_setup{m_workspace.context()};
+    bool m_ready = false;
+};
+
+// Runs once, when the connection starts its first statement that reads the Fields.
+int beforeFieldsAreRead(unsigned, void *action, void *, void *sql)
+{
+    auto &pending = *static_cast<std::function<void()> *>(action);
+    if (pending && QByteArray(static_cast<const char *>(sql)).contains("FROM Fields"))
+        std::exchange(pending, nullptr)();
+    return 0;
+}
+
+} // namespace
 
 using Selection = ProduceCommand::Selection;
 using Outcome = ProduceCommand::Outcome;
@@ -30,6 +80,7 @@ private Q_SLOTS:
     void noSourceAndNoFile();
     void unreadableCompanyFileIsReported();
     void moneyWorksWithoutDocumentOrFile();
+    void anotherCopysSetupReachesTheNextProduceWhole();
 
 private:
     bool start()
@@ -165,6 +216,42 @@ void TestProduceCommand::moneyWorksWithoutDocumentOrFile()
     QVERIFY(m_workspace->prompter().messages().last().text.startsWith(
         u"There is no running instance of MoneyWorks and your primary Account data file has not "
         u"been specified!"_s));
+}
+
+void TestProduceCommand::anotherCopysSetupReachesTheNextProduceWhole()
+{
+    QVERIFY(start());
+    AppContext &context = m_workspace->context();
+    const auto produced = [&](int field) {
+        return ProduceCommand(context).produce({2, 2008, 2, 2008}) == Outcome::Produced
+                   ? context.periodDataSet().getFieldValue(field)
+                   : -1.0;
+    };
+    QCOMPARE(produced(13), 2900.0);
+    OtherCopy other(m_workspace->sharedFolder());
+    QVERIFY(other.isReady());
+
+    // The other copy saves the new rate and the new mapping just as this one begins to read
+    // the Fields; a lock it cannot get fails its save quickly.
+    sqlite3_busy_timeout(other.handle(), 50);
+    std::function<void()> saveBoth = [&] {
+        other.saveRate();
+        other.saveMapping();
+    };
+    sqlite3 *handle = context.mainDatabase().connection().handle();
+    sqlite3_trace_v2(handle, SQLITE_TRACE_STMT, beforeFieldsAreRead, &saveBoth);
+    const double sales = produced(13);
+    sqlite3_trace_v2(handle, 0, nullptr, nullptr);
+    QVERIFY(!saveBoth); // the produce did read the Fields again
+    // Both changes or neither: never the old rate with the new mapping.
+    QCOMPARE(RangeLoader(context).hourlyRate(1) == 50.0, sales == 0.0);
+
+    // Saved in full, each reaches the next produce. Panel labour hours are the panel labour
+    // sales over the panel rate.
+    QVERIFY(other.saveRate());
+    QCOMPARE(produced(62), 58.0);
+    QVERIFY(other.saveMapping());
+    QCOMPARE(produced(13), 0.0);
 }
 
 QTEST_GUILESS_MAIN(TestProduceCommand)

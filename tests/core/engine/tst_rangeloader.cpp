@@ -2,6 +2,7 @@
 #include "testworkspace.h"
 
 #include "app/settingsloader.h"
+#include "app/shutdown.h"
 #include "database/mainconnector.h"
 #include "engine/formulatable.h"
 #include "engine/rangeloader.h"
@@ -40,12 +41,14 @@ public:
     void disconnect() override {}
     double accountMovement(const QString &, const QDate &, const QDate &) override
     {
-        ++queries;
+        if (++queries == 1 && duringFirstQuery)
+            duringFirstQuery();
         return -10.0;
     }
     qint16 jobsCount(const QDate &, const QDate &) override { return 4; }
     std::optional<QDate> currentPeriodEnd() override { return m_periodEnd; }
     int queries = 0;
+    std::function<void()> duringFirstQuery;
 
 private:
     QDate m_periodEnd;
@@ -72,6 +75,7 @@ private Q_SLOTS:
     void periodLimit_data();
     void periodLimit();
     void hourlyRates();
+    void halfLoadIsNeverCached();
     void everyStepParses();
 
 private:
@@ -364,6 +368,23 @@ void TestRangeLoader::hourlyRates()
     execute(u"UPDATE Hours SET Value = NULL WHERE ID = 2"_s);
     context().mainDatabase().hoursRecordset().requery();
     QCOMPARE(loader.hourlyRate(2), 0.0);
+}
+
+void TestRangeLoader::halfLoadIsNeverCached()
+{
+    auto source = std::make_unique<PeriodLimitedSource>(July31);
+    bool busy = false;
+    // Shut down from inside the load, as a network request acted on there once did.
+    source->duringFirstQuery = [&] {
+        busy = context().isBusy();
+        shutDown(context());
+    };
+    context().setAccountingSource(std::move(source));
+    load(July1, July31);
+    QVERIFY(busy);
+    QVERIFY(!context().isBusy());
+    QVERIFY(!QFileInfo::exists(context().settings().cacheFile));
+    QVERIFY(!context().periodDataSet().isFilling(0));
 }
 
 void TestRangeLoader::everyStepParses()

@@ -89,30 +89,40 @@ void TestUserCounter::pollActsOnceAndWithdrawsTheRequest_data()
 {
     QTest::addColumn<QString>("request");
     QTest::addColumn<UserPoll::Action>("action");
-    QTest::newRow("log off") << u"Logoff"_s << UserPoll::Action::Logoff;
-    QTest::newRow("shut down") << u"Shutdown"_s << UserPoll::Action::Shutdown;
-    QTest::newRow("disconnect") << u"Disconnect"_s << UserPoll::Action::Disconnect;
-    QTest::newRow("something else") << u"Reboot"_s << UserPoll::Action::None;
+    QTest::addColumn<bool>("duringLoad");
+    QTest::newRow("log off") << u"Logoff"_s << UserPoll::Action::Logoff << false;
+    QTest::newRow("shut down") << u"Shutdown"_s << UserPoll::Action::Shutdown << false;
+    QTest::newRow("disconnect") << u"Disconnect"_s << UserPoll::Action::Disconnect << false;
+    QTest::newRow("something else") << u"Reboot"_s << UserPoll::Action::None << false;
+    QTest::newRow("shut down during a load") << u"Shutdown"_s << UserPoll::Action::Shutdown << true;
+    QTest::newRow("disconnect during a load")
+        << u"Disconnect"_s << UserPoll::Action::Disconnect << true;
 }
 
 void TestUserCounter::pollActsOnceAndWithdrawsTheRequest()
 {
     QFETCH(QString, request);
     QFETCH(UserPoll::Action, action);
+    QFETCH(bool, duringLoad);
     UserPoll thisCopy;
     UserPoll otherCopy;
     QCOMPARE(config().setConfigValue(4, u"3"_s), std::nullopt);
     QCOMPARE(thisCopy.tick(config()).action, UserPoll::Action::None);
 
     QCOMPARE(config().setConfigValue(5, request), std::nullopt);
-    const UserPoll::Result first = thisCopy.tick(config());
+    const UserPoll::Result first = thisCopy.tick(config(), duringLoad);
     QCOMPARE(first.activeUsers, u"3"_s);
-    QCOMPARE(first.action, action);
+    QCOMPARE(first.action, duringLoad ? UserPoll::Action::None : action);
     QCOMPARE(otherCopy.tick(config()).action, action);
-    // The next tick finds the same request again: it is withdrawn for everybody.
-    QCOMPARE(thisCopy.tick(config()).action, UserPoll::Action::None);
+    // The next tick finds the same request again: it is withdrawn for everybody, also while
+    // this copy is loading.
+    QCOMPARE(thisCopy.tick(config(), duringLoad).action, UserPoll::Action::None);
     QCOMPARE(config().getConfigValue(5), QString());
     QCOMPARE(thisCopy.lastRequest(), QString());
+    // A request held back for a load is carried out by the first tick after it, once.
+    if (duringLoad)
+        QCOMPARE(thisCopy.tick(config()).action, action);
+    QCOMPARE(thisCopy.tick(config()).action, UserPoll::Action::None);
     QCOMPARE(otherCopy.tick(config()).action, UserPoll::Action::None);
 }
 

@@ -15,6 +15,7 @@
 #include "views/kpitabview.h"
 
 #include <QComboBox>
+#include <QDialog>
 #include <QJsonArray>
 #include <QJsonDocument>
 #include <QJsonObject>
@@ -45,7 +46,8 @@ private Q_SLOTS:
     void clockFormat();
     void typeAheadCompletesNames();
     void twoWindowsCountToTwoAndBack();
-    void shutdownRequestClosesTheWindow();
+    void shutdownRequestEndsTheProgramUnderADialog();
+    void logoffRequestIsWithdrawnWhileItsBoxIsOpen();
     void produceShowsTheDemoFigures();
     void setupMenuFollowsTheUser_data();
     void setupMenuFollowsTheUser();
@@ -212,7 +214,7 @@ void TestMainWindow::resetCounterLogsEveryWindowOff()
     m_workspace->prompter().clearMessages();
     window->pollUsers();
     QVERIFY(!m_workspace->context().loginState().loggedIn);
-    QCOMPARE(m_workspace->prompter().messages().size(), 1);
+    QTRY_COMPARE(m_workspace->prompter().messages().size(), 1);
     QCOMPARE(m_workspace->prompter().messages().first().title, u"Network Request"_s);
     window->pollUsers(); // the second look withdraws the request
     const ConfigValues config(m_workspace->context().mainDatabase(), m_workspace->prompter());
@@ -270,19 +272,50 @@ void TestMainWindow::twoWindowsCountToTwoAndBack()
              u"0"_s);
 }
 
-void TestMainWindow::shutdownRequestClosesTheWindow()
+void TestMainWindow::shutdownRequestEndsTheProgramUnderADialog()
 {
     auto window = openWindow(*m_workspace);
     QVERIFY(window);
     window->show();
     QVERIFY(QTest::qWaitForWindowExposed(window.get()));
+    QDialog dialog(window.get());
+    bool ended = false;
+    window->setProgramEnd([&] {
+        ended = true;
+        dialog.reject();
+    });
     QCOMPARE(ConfigValues(m_workspace->context().mainDatabase(), m_workspace->prompter())
                  .setConfigValue(5, u"Shutdown"_s),
              std::nullopt);
-    window->pollUsers();
+    // The poll comes while the dialog runs its own event loop.
+    QTimer::singleShot(0, window.get(), &MainWindow::pollUsers);
+    QTimer::singleShot(10000, &dialog, &QDialog::reject);
+    dialog.exec();
+    QVERIFY(ended);
     QVERIFY(!window->isVisible());
     // Shut down in order: the database is closed.
     QVERIFY(!m_workspace->context().mainDatabase().isConnected());
+}
+
+void TestMainWindow::logoffRequestIsWithdrawnWhileItsBoxIsOpen()
+{
+    auto window = openWindow(*m_workspace);
+    QVERIFY(window);
+    const ConfigValues config(m_workspace->context().mainDatabase(), m_workspace->prompter());
+    bool withdrawnWhileOpen = false;
+    m_workspace->prompter().setWhileShown([&](const RecordingPrompter::Message &message) {
+        if (message.title != u"Network Request"_s)
+            return;
+        // The box stays open for two polls at most; this copy's own poll must withdraw the
+        // request meanwhile.
+        withdrawnWhileOpen = QTest::qWaitFor([&] { return config.getConfigValue(5).isEmpty(); },
+                                             2 * UserPoll::IntervalMs + 500);
+    });
+    QCOMPARE(config.setConfigValue(5, u"Logoff"_s), std::nullopt);
+    QTRY_VERIFY_WITH_TIMEOUT(!m_workspace->prompter().messages().isEmpty(),
+                             2 * UserPoll::IntervalMs);
+    QTRY_VERIFY_WITH_TIMEOUT(withdrawnWhileOpen, 3 * UserPoll::IntervalMs);
+    m_workspace->prompter().setWhileShown({});
 }
 
 void TestMainWindow::produceShowsTheDemoFigures()
