@@ -3,6 +3,7 @@
 
 #include "views/gridmodel.h"
 
+#include <QHash>
 #include <QString>
 #include <QVariant>
 
@@ -41,7 +42,13 @@ public:
                   const QString &field, const Conversion &conversion,
                   const QString &errorContext) const;
 
+    // Remembers the editable texts as the list now shows them. A row whose text is still the
+    // same at the save is not written: what is shown may be rounded from what is stored, and
+    // nobody asked to change it.
+    void rememberShownTexts();
+
 private:
     GridModel &m_grid;
     Columns m_columns;
+    QHash<QString, QString> m_shownTexts; // by the row's ID
 };

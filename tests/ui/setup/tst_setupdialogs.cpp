@@ -131,23 +131,30 @@ void TestSetupDialogs::cleanup()
 
 void TestSetupDialogs::rateEdits_data()
 {
+    QTest::addColumn<double>("before");
     QTest::addColumn<QString>("typed");
     QTest::addColumn<QString>("shown");
     QTest::addColumn<double>("saved");
-    QTest::newRow("decimal") << u"1234.5"_s << u"1,234.50"_s << 1234.5;
-    QTest::newRow("grouped") << u"1,100"_s << u"1,100.00"_s << 1100.0;
-    QTest::newRow("zero") << u"0"_s << u"0.00"_s << 0.0;
-    QTest::newRow("letters") << u"abc"_s << u"0"_s << 0.0;
-    QTest::newRow("empty") << QString() << u"0"_s << 0.0;
+    QTest::addColumn<bool>("refused");
+    QTest::newRow("decimal") << 65.0 << u"1234.5"_s << u"1,234.50"_s << 1234.5 << false;
+    QTest::newRow("grouped") << 65.0 << u"1,100"_s << u"1,100.00"_s << 1100.0 << false;
+    QTest::newRow("zero") << 65.0 << u"0"_s << u"0.00"_s << 0.0 << false;
+    QTest::newRow("letters are refused") << 65.0 << u"abc"_s << u"65.00"_s << 65.0 << true;
+    QTest::newRow("empty clears the rate") << 65.0 << QString() << u"0.00"_s << 0.0 << false;
+    QTest::newRow("unchanged rate keeps its decimals")
+        << 65.125 << u"65.13"_s << u"65.13"_s << 65.125 << false;
 }
 
 void TestSetupDialogs::rateEdits()
 {
+    QFETCH(double, before);
     QFETCH(QString, typed);
     QFETCH(QString, shown);
     QFETCH(double, saved);
+    QFETCH(bool, refused);
     QVERIFY(connect());
-    OtherCopy(m_workspace->mainDatabase()).exec(u"UPDATE Hours SET Value = 65 WHERE ID = 1"_s);
+    OtherCopy(m_workspace->mainDatabase())
+        .exec(u"UPDATE Hours SET Value = ? WHERE ID = 1"_s, {before});
     HourlyRatesDialog dialog(m_workspace->context());
     dialog.show();
     GridModel &grid = dialog.rates().grid();
@@ -157,15 +164,20 @@ void TestSetupDialogs::rateEdits()
 
     clickCell(dialog.lstRates(), 1, 2); // the department: the rate is edited all the same
     QVERIFY(dialog.txtEdit()->isOpen());
-    QCOMPARE(dialog.txtEdit()->text(), u"65.00"_s);
+    QCOMPARE(dialog.txtEdit()->text(),
+             m_workspace->context().numberFormat().formatMoney(before, false));
     typeInto(dialog.txtEdit(), typed, Qt::Key_Return);
     QVERIFY(!dialog.txtEdit()->isVisible());
     QCOMPARE(grid.cellText(1, 3), shown);
+    QCOMPARE(m_workspace->prompter().messages().size(), refused ? 1 : 0);
+    if (refused) {
+        QCOMPARE(m_workspace->prompter().messages().first().title, u"Invalid Rate"_s);
+        QVERIFY(m_workspace->prompter().messages().first().text.startsWith(u"\"abc\" is not"_s));
+    }
 
     dialog.butOK()->click();
     QVERIFY(!dialog.isVisible());
     QCOMPARE(stored(u"SELECT Value FROM Hours WHERE ID = 1"_s).toDouble(), saved);
-    QVERIFY(m_workspace->prompter().messages().isEmpty());
 }
 
 void TestSetupDialogs::escapeKeepsTheRate()
