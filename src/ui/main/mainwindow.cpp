@@ -10,6 +10,7 @@
 #include "setup/programsetupdialog.h"
 #include "users/useraccountsdialog.h"
 #include "views/comparewindow.h"
+#include "views/gridview.h"
 #include "views/kpitabview.h"
 #include "views/tabbuttons.h"
 
@@ -290,6 +291,8 @@ QWidget *MainWindow::buildKpiPanel()
     tabs->addWidget(legend);
 
     m_tabView = new KpiTabView(m_context, m_kpiPanel);
+    // The Field's name takes the width the figures leave, as the window is resized.
+    m_tabView->lstGrid()->setFittedColumn(m_tabView->grid().columnIndex(u"label"_s));
     auto *layout = new QVBoxLayout(m_kpiPanel);
     layout->addLayout(dates);
     layout->addLayout(tabs);

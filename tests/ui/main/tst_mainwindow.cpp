@@ -139,6 +139,10 @@ void TestMainWindow::builtInAccountWithNoUsers()
     window->login(u"sysop"_s, u"sysop"_s);
     QVERIFY(window->menuSetup()->isEnabled());
     QCOMPARE(window->lblActiveUsers()->text(), u"0 users are logged in"_s);
+    // "The Past 1 Year", "The Past 2 Years".
+    QCOMPARE(window->lstCompareType()->itemText(0), u"Year"_s);
+    window->lstCompareCount()->setCurrentIndex(1);
+    QCOMPARE(window->lstCompareType()->itemText(1), u"Periods"_s);
 }
 
 void TestMainWindow::failedLogin()
