@@ -324,23 +324,16 @@ void TestRangeLoader::periodLimit_data()
 {
     QTest::addColumn<QDate>("periodEnd");
     QTest::addColumn<bool>("beyond");
-    QTest::addColumn<QString>("messageEnd"); // after "... 31/7/25"
-    QTest::newRow("ends with the period") << July31 << false << QString();
-    QTest::newRow("period ends later") << QDate(2026, 6, 30) << false << QString();
-    QTest::newRow("period ended before")
-        << QDate(2025, 6, 30) << true
-        << u" exceeds the\r\naccounting period of your MoneyWorks file which ends 30/6/25!"_s;
-    QTest::newRow("period end unreadable")
-        << QDate() << true
-        << u" cannot be checked against the\r\naccounting period of your MoneyWorks file, whose "
-           u"end could not be read!"_s;
+    QTest::newRow("ends with the period") << July31 << false;
+    QTest::newRow("period ends later") << QDate(2026, 6, 30) << false;
+    QTest::newRow("period ended before") << QDate(2025, 6, 30) << true;
+    QTest::newRow("period end unreadable") << QDate() << true;
 }
 
 void TestRangeLoader::periodLimit()
 {
     QFETCH(QDate, periodEnd);
     QFETCH(bool, beyond);
-    QFETCH(QString, messageEnd);
     auto source = std::make_unique<PeriodLimitedSource>(periodEnd);
     PeriodLimitedSource *fake = source.get();
     context().setAccountingSource(std::move(source));
@@ -355,8 +348,9 @@ void TestRangeLoader::periodLimit()
     if (beyond) {
         QCOMPARE(messages.first().title, u"Data Out Of Range"_s);
         QCOMPARE(messages.first().icon, Prompter::Icon::Exclamation);
-        QCOMPARE(messages.first().text,
-                 u"The selected date range 1/7/25 to 31/7/25"_s + messageEnd);
+        QVERIFY(messages.first().text.endsWith(periodEnd.isValid()
+                                                   ? u"MoneyWorks file which ends 30/6/25!"_s
+                                                   : u"file, whose end could not be read!"_s));
         QCOMPARE(storedValue(13), u"<absent>"_s);
     }
 }

@@ -131,30 +131,25 @@ void TestSetupDialogs::cleanup()
 
 void TestSetupDialogs::rateEdits_data()
 {
-    QTest::addColumn<double>("before");
     QTest::addColumn<QString>("typed");
     QTest::addColumn<QString>("shown");
     QTest::addColumn<double>("saved");
-    QTest::addColumn<bool>("refused");
-    QTest::newRow("decimal") << 65.0 << u"1234.5"_s << u"1,234.50"_s << 1234.5 << false;
-    QTest::newRow("grouped") << 65.0 << u"1,100"_s << u"1,100.00"_s << 1100.0 << false;
-    QTest::newRow("zero") << 65.0 << u"0"_s << u"0.00"_s << 0.0 << false;
-    QTest::newRow("letters are refused") << 65.0 << u"abc"_s << u"65.00"_s << 65.0 << true;
-    QTest::newRow("empty clears the rate") << 65.0 << QString() << u"0.00"_s << 0.0 << false;
-    QTest::newRow("unchanged rate keeps its decimals")
-        << 65.125 << u"65.13"_s << u"65.13"_s << 65.125 << false;
+    QTest::addColumn<QString>("message"); // its title
+    QTest::newRow("decimal") << u"1234.5"_s << u"1,234.50"_s << 1234.5 << QString();
+    QTest::newRow("grouped") << u"1,100"_s << u"1,100.00"_s << 1100.0 << QString();
+    QTest::newRow("zero") << u"0"_s << u"0.00"_s << 0.0 << QString();
+    QTest::newRow("letters keep the rate") << u"abc"_s << u"65.00"_s << 65.0 << u"Invalid Rate"_s;
+    QTest::newRow("empty clears it") << QString() << u"0.00"_s << 0.0 << QString();
 }
 
 void TestSetupDialogs::rateEdits()
 {
-    QFETCH(double, before);
     QFETCH(QString, typed);
     QFETCH(QString, shown);
     QFETCH(double, saved);
-    QFETCH(bool, refused);
+    QFETCH(QString, message);
     QVERIFY(connect());
-    OtherCopy(m_workspace->mainDatabase())
-        .exec(u"UPDATE Hours SET Value = ? WHERE ID = 1"_s, {before});
+    OtherCopy(m_workspace->mainDatabase()).exec(u"UPDATE Hours SET Value = 65 WHERE ID = 1"_s);
     HourlyRatesDialog dialog(m_workspace->context());
     dialog.show();
     GridModel &grid = dialog.rates().grid();
@@ -164,25 +159,22 @@ void TestSetupDialogs::rateEdits()
 
     clickCell(dialog.lstRates(), 1, 2); // the department: the rate is edited all the same
     QVERIFY(dialog.txtEdit()->isOpen());
-    QCOMPARE(dialog.txtEdit()->text(),
-             m_workspace->context().numberFormat().formatMoney(before, false));
+    QCOMPARE(dialog.txtEdit()->text(), u"65.00"_s);
     typeInto(dialog.txtEdit(), typed, Qt::Key_Return);
     QVERIFY(!dialog.txtEdit()->isVisible());
     QCOMPARE(grid.cellText(1, 3), shown);
-    QCOMPARE(m_workspace->prompter().messages().size(), refused ? 1 : 0);
-    if (refused) {
-        QCOMPARE(m_workspace->prompter().messages().first().title, u"Invalid Rate"_s);
-        QVERIFY(m_workspace->prompter().messages().first().text.startsWith(u"\"abc\" is not"_s));
-    }
 
     dialog.butOK()->click();
     QVERIFY(!dialog.isVisible());
     QCOMPARE(stored(u"SELECT Value FROM Hours WHERE ID = 1"_s).toDouble(), saved);
+    QCOMPARE(m_workspace->prompter().messages().value(0).title, message);
 }
 
 void TestSetupDialogs::escapeKeepsTheRate()
 {
     QVERIFY(connect());
+    // A rate nobody edits is kept exactly, though the list shows it rounded.
+    OtherCopy(m_workspace->mainDatabase()).exec(u"UPDATE Hours SET Value = 65.125 WHERE ID = 1"_s);
     HourlyRatesDialog dialog(m_workspace->context());
     dialog.show();
     clickCell(dialog.lstRates(), 2, 3);
@@ -191,6 +183,7 @@ void TestSetupDialogs::escapeKeepsTheRate()
     QCOMPARE(dialog.rates().grid().cellText(2, 3), u"0.00"_s);
     dialog.butOK()->click();
     QCOMPARE(stored(u"SELECT Value FROM Hours WHERE ID = 2"_s).toDouble(), 0.0);
+    QCOMPARE(stored(u"SELECT Value FROM Hours WHERE ID = 1"_s).toDouble(), 65.125);
 }
 
 void TestSetupDialogs::typedKeyOpensTheBoxAndArrowsMove()
