@@ -7,6 +7,7 @@
 #include "settingsstore.h"
 
 #include "cipher/passwordcipher.h"
+#include "cipher/windows1252.h"
 
 using namespace Qt::StringLiterals;
 
@@ -39,6 +40,7 @@ bool SystemConfiguration::save(Values &values) const
 {
     values.dbPath = FileOperations::addTrailingSlash(values.dbPath);
     const bool myob = values.package == u"MYOB"_s;
+    const std::optional<QString> unheld = Windows1252::firstUnheldCharacter(values.password);
 
     struct Check
     {
@@ -59,6 +61,12 @@ bool SystemConfiguration::save(Values &values) const
              !FileOperations::fileExists(values.accFilePath),
          u"The account data file path you specified does not exist or is inacessible!"_s,
          u"Invalid File Path"_s},
+        // The password is stored in the Western European code page; anything else would be
+        // stored as "?" and the accounting login would later fail without a hint.
+        {unheld.has_value(),
+         u"The password cannot contain the character \"%1\". Passwords may use letters, digits "
+         u"and the symbols of Western European keyboards."_s.arg(unheld.value_or(QString())),
+         u"Invalid Password"_s},
     };
     for (const Check &check : checks) {
         if (check.failed) {

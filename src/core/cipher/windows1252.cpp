@@ -41,6 +41,22 @@ QByteArray fromUnicode(const QString &text)
     return bytes;
 }
 
+std::optional<QString> firstUnheldCharacter(const QString &text)
+{
+    for (qsizetype i = 0; i < text.size(); ++i) {
+        const QChar c = text.at(i);
+        if (c.isSurrogate()) {
+            const bool pair =
+                c.isHighSurrogate() && i + 1 < text.size() && text.at(i + 1).isLowSurrogate();
+            return text.mid(i, pair ? 2 : 1);
+        }
+        // "?" is the one character that comes back as itself from the fallback.
+        if (c != u'?' && byteFor(c.unicode()) == '?')
+            return QString(c);
+    }
+    return std::nullopt;
+}
+
 QString toUnicode(const QByteArray &bytes)
 {
     QString text;

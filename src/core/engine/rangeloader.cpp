@@ -79,11 +79,15 @@ bool RangeLoader::outOfRange(const QDate &start, const QDate &end)
     const auto shortDate = [&](const QDate &date) {
         return date.isValid() ? locale.toString(date, QLocale::ShortFormat) : QString();
     };
-    m_context.prompter().message(u"The selected date range "_s + shortDate(start) + u" to "_s +
-                                     shortDate(end) + u" exceeds the\r\naccounting period of "_s +
-                                     u"your MoneyWorks file which ends "_s + shortDate(*periodEnd) +
-                                     u"!"_s,
-                                 u"Data Out Of Range"_s, Prompter::Icon::Exclamation);
+    const QString range =
+        u"The selected date range "_s + shortDate(start) + u" to "_s + shortDate(end);
+    m_context.prompter().message(
+        periodEnd->isValid()
+            ? range + u" exceeds the\r\naccounting period of your MoneyWorks file which ends "_s +
+                  shortDate(*periodEnd) + u"!"_s
+            : range + u" cannot be checked against the\r\naccounting period of your MoneyWorks "_s +
+                  u"file, whose end could not be read!"_s,
+        u"Data Out Of Range"_s, Prompter::Icon::Exclamation);
     return true;
 }
 

@@ -138,10 +138,15 @@ QString gridToHtml(const GridModel &grid, const QString &exclusions)
     return html;
 }
 
-QString reportTitle(const QDate &start, const QDate &end, const QLocale &locale)
+QString reportTitle(const QDate &start, const QDate &end, const QLocale &locale, const QDate &today)
 {
-    return locale.toString(start, QLocale::ShortFormat) + u" to "_s +
-           locale.toString(end, QLocale::ShortFormat);
+    const QString range = locale.toString(start, QLocale::ShortFormat) + u" to "_s +
+                          locale.toString(end, QLocale::ShortFormat);
+    // Figures of a range that has not ended yet stop at today; the reader must not take them
+    // for the whole range.
+    if (!today.isValid() || !end.isValid() || end <= today)
+        return range;
+    return range + u" (to date: "_s + QLocale::c().toString(today, u"d MMM yyyy"_s) + u")"_s;
 }
 
 QString reportPage(const GridModel &grid, const QString &exclusions, const QString &picturePath)

@@ -22,8 +22,10 @@ bool isInList(const QStringList &list, const QString &text, bool caseSensitive);
 QString gridToHtml(const GridModel &grid, const QString &exclusions);
 // The whole page; the picture paragraph only when the path names an existing file.
 QString reportPage(const GridModel &grid, const QString &exclusions, const QString &picturePath);
-// The report's title: the produced range, "1/7/25 to 30/6/26" in the region's short dates.
-QString reportTitle(const QDate &start, const QDate &end, const QLocale &locale);
+// The report's title: the produced range, "1/7/25 to 30/6/26" in the region's short dates,
+// with "(to date: 7 Dec 2026)" after it when the range ends after today.
+QString reportTitle(const QDate &start, const QDate &end, const QLocale &locale,
+                    const QDate &today = {});
 // A font size as the page writes it: "10.25", "12".
 QString fontSizeText(double points);
 

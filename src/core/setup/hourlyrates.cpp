@@ -4,6 +4,7 @@
 #include "app/appcontext.h"
 #include "app/errorreporter.h"
 #include "app/numberformat.h"
+#include "app/prompter.h"
 #include "database/maindatabase.h"
 #include "database/recordoperations.h"
 #include "views/gridoperations.h"
@@ -48,15 +49,28 @@ void HourlyRates::load()
             m_grid.setCellText(row, RateColumn, m_context.numberFormat().formatMoney(rate, false));
     }
     m_grid.setRedraw(true);
+    m_list.rememberShownTexts();
 }
 
-void HourlyRates::commitEdit(int row, const QString &text)
+bool HourlyRates::commitEdit(int row, const QString &text)
 {
     if (row < 1 || row > m_grid.rowCount())
-        return;
+        return false;
     const NumberFormat &numbers = m_context.numberFormat();
-    const std::optional<double> rate = numbers.parseNumber(text);
-    m_grid.setCellText(row, RateColumn, rate ? numbers.formatMoney(*rate, false) : u"0"_s);
+    // An emptied box clears the rate.
+    const std::optional<double> rate =
+        text.trimmed().isEmpty() ? std::optional<double>(0.0) : numbers.parseNumber(text);
+    if (!rate) {
+        m_context.prompter().message(
+            u"\"%1\" is not an hourly rate. Type the rate in dollars, for example %2.\r\n\r\n"
+            u"The rate of %3 has not been changed."_s.arg(
+                text.trimmed(), numbers.formatMoney(65.5, false),
+                m_grid.cellText(row, m_grid.columnIndex(u"department"_s))),
+            u"Invalid Rate"_s, Prompter::Icon::Exclamation);
+        return false;
+    }
+    m_grid.setCellText(row, RateColumn, numbers.formatMoney(*rate, false));
+    return true;
 }
 
 bool HourlyRates::save()

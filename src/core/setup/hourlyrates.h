@@ -20,9 +20,9 @@ public:
     // Reads the departments and their rates; the rate cells are marked editable.
     void load();
     GridModel &grid() { return m_grid; }
-    // A finished edit of a row's rate: a number is shown as money ("1,234.50"), anything
-    // else as 0.
-    void commitEdit(int row, const QString &text);
+    // A finished edit of a row's rate: a number is shown as money ("1,234.50") and an empty
+    // box as 0.00; anything else is refused with a message and the rate stays as it was.
+    bool commitEdit(int row, const QString &text);
     // Writes every rate; false when a failure stopped it (reported under "Save Labour Hours").
     bool save();
 

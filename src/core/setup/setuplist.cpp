@@ -43,10 +43,14 @@ bool SetupList::saveInto(AppContext &context, RecordSet &records, const QString 
     for (int row = 1; row <= m_grid.rowCount(); ++row) {
         if (isHeading(row))
             continue;
+        const QString text = m_grid.cellText(row, m_columns.editable);
+        const auto shown = m_shownTexts.constFind(m_grid.cellText(row, 1));
+        if (shown != m_shownTexts.cend() && *shown == text)
+            continue;
         const qint64 id = m_grid.cellText(row, 1).toLongLong();
         if (!operations.findRecordById(records, id))
             continue;
-        const QVariant value = conversion(m_grid.cellText(row, m_columns.editable));
+        const QVariant value = conversion(text);
         if (records.value(field) == value)
             continue;
         std::optional<DbError> failure = records.setValue(field, value);
@@ -76,4 +80,13 @@ bool SetupList::saveTogether(AppContext &context, const QString &errorContext,
         return false;
     }
     return saved;
+}
+
+void SetupList::rememberShownTexts()
+{
+    m_shownTexts.clear();
+    for (int row = 1; row <= m_grid.rowCount(); ++row) {
+        if (!isHeading(row))
+            m_shownTexts.insert(m_grid.cellText(row, 1), m_grid.cellText(row, m_columns.editable));
+    }
 }

@@ -3,6 +3,7 @@
 
 #include "views/gridmodel.h"
 
+#include <QHash>
 #include <QString>
 #include <QVariant>
 
@@ -47,7 +48,13 @@ public:
     static bool saveTogether(AppContext &context, const QString &errorContext,
                              const std::function<bool()> &saves);
 
+    // Remembers the editable texts as the list now shows them. A row whose text is still the
+    // same at the save is not written: what is shown may be rounded from what is stored, and
+    // nobody asked to change it.
+    void rememberShownTexts();
+
 private:
     GridModel &m_grid;
     Columns m_columns;
+    QHash<QString, QString> m_shownTexts; // by the row's ID
 };

@@ -25,7 +25,7 @@ std::optional<QString> LoginSession::login(const QString &userName, const QStrin
     return ConfigValues(database, m_context.prompter()).getConfigValue(ConfigValues::UserCount);
 }
 
-void LoginSession::logoff(bool reset)
+bool LoginSession::logoff(bool reset)
 {
     // Every copy but the built-in account's takes one off, even one that was not logged in,
     // so that a "Logoff" request brings a count left too high back down.
@@ -33,9 +33,10 @@ void LoginSession::logoff(bool reset)
         if (const auto error = UserCounter(m_context.mainDatabase()).decrement()) {
             ErrorReporter(m_context.prompter())
                 .reportError(error->number, error->description, u"Logoff"_s);
-            return;
+            return false;
         }
     }
     if (reset)
         m_context.loginState() = LoginState();
+    return true;
 }

@@ -20,7 +20,8 @@ public:
     // not let anyone in (the login state is then cleared).
     std::optional<QString> login(const QString &userName, const QString &password);
     // Takes this copy's user off the count. With reset the login state is cleared as well.
-    void logoff(bool reset);
+    // False when the count could not be written (reported); the user is then still logged in.
+    bool logoff(bool reset);
 
 private:
     AppContext &m_context;

@@ -49,3 +49,10 @@ std::optional<DbError> UserCounter::reset()
         return SqliteConnection::errorFrom(database.lastError());
     return std::nullopt;
 }
+
+QString UserCounter::loggedInText(const QString &count)
+{
+    if (count.trimmed() == u"1"_s)
+        return count + u" user is logged in"_s;
+    return count + u" users are logged in"_s;
+}

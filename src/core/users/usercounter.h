@@ -3,6 +3,8 @@
 
 #include "database/dberror.h"
 
+#include <QString>
+
 #include <optional>
 
 class MainDatabase;
@@ -22,6 +24,10 @@ public:
     std::optional<DbError> decrement();
     // The counter to 0 and a "Logoff" request to every copy, together.
     std::optional<DbError> reset();
+
+    // The status bar's text for the count as read: "3 users are logged in", "1 user is logged
+    // in".
+    static QString loggedInText(const QString &count);
 
 private:
     std::optional<DbError> execute(const QString &sql);

@@ -2,6 +2,7 @@
 #include "gridmodel.h"
 
 #include <QDateTime>
+#include <QLocale>
 
 #include <algorithm>
 
@@ -117,9 +118,25 @@ void GridModel::changed()
         m_pendingChange = true;
 }
 
+namespace {
+
+// A date cell holds a date, or the text the program wrote it as in the column's format
+// ("5 Dec 2026 9:05 AM", English month names whatever the region).
+QDateTime dateOf(const QVariant &value, const QString &format)
+{
+    if (value.metaType().id() == QMetaType::QDateTime || value.metaType().id() == QMetaType::QDate)
+        return value.toDateTime();
+    const QString text = value.toString().trimmed();
+    const QDateTime written = QLocale::c().toDateTime(text, format);
+    return written.isValid() ? written : QDateTime::fromString(text, Qt::ISODate);
+}
+
+} // namespace
+
 void GridModel::sort(int column, bool ascending, int sortType)
 {
     const auto key = [&](const Row &row) { return row.cells.at(column - 1).value; };
+    const QString dateFormat = m_columns.at(column - 1).dateFormat;
     const auto less = [&](const Row &a, const Row &b) {
         const QVariant left = key(a);
         const QVariant right = key(b);
@@ -127,7 +144,7 @@ void GridModel::sort(int column, bool ascending, int sortType)
         case SortNumber:
             return left.toDouble() < right.toDouble();
         case SortDate:
-            return left.toDateTime() < right.toDateTime();
+            return dateOf(left, dateFormat) < dateOf(right, dateFormat);
         default:
             return left.toString().compare(right.toString(), Qt::CaseInsensitive) < 0;
         }

@@ -106,7 +106,8 @@ QList<TabViewBuilder::GraphBar> TabViewBuilder::graphBars(const GridModel &grid,
     const RecordOperations records(database, m_context.prompter());
     const int benchmarkColumn = grid.columnIndex(u"benchmark"_s);
     for (int row = 1; benchmarkColumn && row <= grid.rowCount(); ++row) {
-        if (grid.cellText(row, benchmarkColumn).isEmpty())
+        // A line the user may not see has no bar either.
+        if (!grid.isRowVisible(row) || grid.cellText(row, benchmarkColumn).isEmpty())
             continue;
         const qint64 id = grid.cellText(row, 1).toLongLong();
         // A Field without a record has no benchmark to draw against in any period.

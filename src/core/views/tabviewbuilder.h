@@ -31,7 +31,7 @@ public:
         double value = 0.0;
     };
 
-    // The bars of the graph, from the grid's rows with a benchmark, in order; with earlier
+    // The bars of the graph, from the grid's visible rows with a benchmark, in order; with earlier
     // periods each Field has one bar per period with data, the oldest first.
     QList<GraphBar> graphBars(const GridModel &grid, int pastCount = 0);
 

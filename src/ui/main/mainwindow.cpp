@@ -5,10 +5,12 @@
 #include "app/loadingwindow.h"
 #include "app/webpages.h"
 #include "report/gridreport.h"
+#include "report/printwindow.h"
 #include "setup/hourlyratesdialog.h"
 #include "setup/programsetupdialog.h"
 #include "users/useraccountsdialog.h"
 #include "views/comparewindow.h"
+#include "views/gridview.h"
 #include "views/kpitabview.h"
 #include "views/tabbuttons.h"
 
@@ -28,6 +30,7 @@
 #include "views/kpigrid.h"
 #include "views/tabviewbuilder.h"
 
+#include <QAction>
 #include <QCheckBox>
 #include <QCloseEvent>
 #include <QComboBox>
@@ -38,6 +41,7 @@
 #include <QGridLayout>
 #include <QHBoxLayout>
 #include <QKeyEvent>
+#include <QKeySequence>
 #include <QLabel>
 #include <QLineEdit>
 #include <QMenuBar>
@@ -69,6 +73,9 @@ MainWindow::MainWindow(AppContext &context, Prompter &prompter, QWidget *parent)
     m_lblDT = new QLabel(this);
     statusBar()->addWidget(m_lblLoggedIn, 1);
     statusBar()->addWidget(m_lblActiveUsers, 1);
+    m_lblToDate = new QLabel(this);
+    m_lblToDate->setObjectName(u"lblToDate"_s);
+    statusBar()->addWidget(m_lblToDate, 2);
     statusBar()->addPermanentWidget(m_lblDT);
 
     m_tmrUsers = new QTimer(this);
@@ -91,7 +98,13 @@ void MainWindow::buildMenus()
 {
     QMenu *file = menuBar()->addMenu(u"&File"_s);
     m_itemLogoff = file->addAction(u"&Logoff"_s, this, [this] { logoff(true); });
+    // The produce button's own key, Alt+P, is also the Parts tab's, so it only moves the
+    // focus; these keys always produce and print.
+    m_itemProduce = file->addAction(u"Produce &KPI"_s, this, &MainWindow::produce);
+    m_itemProduce->setShortcuts({QKeySequence(Qt::Key_F5), QKeySequence(Qt::CTRL | Qt::Key_Return),
+                                 QKeySequence(Qt::CTRL | Qt::Key_Enter)});
     m_itemPrint = file->addAction(u"&Print"_s, this, &MainWindow::print);
+    m_itemPrint->setShortcut(QKeySequence(Qt::CTRL | Qt::Key_P));
     file->addSeparator();
     file->addAction(u"&Exit"_s, this, &QWidget::close);
 
@@ -187,10 +200,14 @@ QWidget *MainWindow::buildKpiPanel()
         auto *box = new QComboBox(m_kpiPanel);
         box->setObjectName(name);
         box->setEditable(true);
+        // A typed year is a choice, not a new entry of the list.
+        box->setInsertPolicy(QComboBox::NoInsert);
         const int currentYear = m_context.settings().currentYear;
         for (int year = currentYear; year >= currentYear - 20; --year)
             box->addItem(QString::number(year));
         box->installEventFilter(this);
+        connect(box->lineEdit(), &QLineEdit::textEdited, this,
+                [this, box] { m_typedYears.insert(box); });
         return box;
     };
     m_lstMonth1 = monthList(u"lstMonth1"_s);
@@ -206,6 +223,10 @@ QWidget *MainWindow::buildKpiPanel()
         return button;
     };
     auto *butProduce = new QPushButton(u"&Produce KPI"_s, m_kpiPanel);
+    butProduce->setObjectName(u"butProduce"_s);
+    butProduce->setToolTip(u"Produce the KPIs of the chosen months (%1 or %2)"_s.arg(
+        m_itemProduce->shortcuts().at(0).toString(QKeySequence::NativeText),
+        m_itemProduce->shortcuts().at(1).toString(QKeySequence::NativeText)));
     connect(butProduce, &QPushButton::clicked, this, &MainWindow::produce);
     m_chkCompare = new QCheckBox(u"See The Big Picture"_s, m_kpiPanel);
     m_chkCompare->setToolTip(u"Lets you compare data from your selected period with past data"_s);
@@ -219,6 +240,14 @@ QWidget *MainWindow::buildKpiPanel()
         m_lstCompareCount->setEnabled(on);
         m_lstCompareType->setEnabled(on);
     });
+    // "The Past 1 Year", "The Past 2 Years".
+    connect(m_lstCompareCount, &QComboBox::currentIndexChanged, this, [this](int index) {
+        const bool one = index == 0;
+        m_lstCompareType->setItemText(0, one ? u"Year"_s : u"Years"_s);
+        m_lstCompareType->setItemText(1, one ? u"Period"_s : u"Periods"_s);
+    });
+    m_lstCompareType->setItemText(0, u"Year"_s);
+    m_lstCompareType->setItemText(1, u"Period"_s);
 
     auto *dates = new QHBoxLayout;
     dates->addWidget(new QLabel(u"From date"_s, m_kpiPanel));
@@ -264,6 +293,8 @@ QWidget *MainWindow::buildKpiPanel()
     tabs->addWidget(legend);
 
     m_tabView = new KpiTabView(m_context, m_kpiPanel);
+    // The Field's name takes the width the figures leave, as the window is resized.
+    m_tabView->lstGrid()->setFittedColumn(m_tabView->grid().columnIndex(u"label"_s));
     auto *layout = new QVBoxLayout(m_kpiPanel);
     layout->addLayout(dates);
     layout->addLayout(tabs);
@@ -283,6 +314,7 @@ void MainWindow::restoreSelection()
     m_lstMonth2->setCurrentIndex(remembered->lastMonth - 1);
     m_lstYear1->setEditText(remembered->firstYear);
     m_lstYear2->setEditText(remembered->lastYear);
+    m_typedYears.clear();
 }
 
 void MainWindow::loadUserList(bool withMessage)
@@ -315,6 +347,7 @@ void MainWindow::updateLoginState()
     m_itemSetupMapping->setEnabled(login.loggedIn &&
                                    login.currentUser == LoginService::BuiltInUser);
     m_itemLogoff->setEnabled(login.loggedIn);
+    m_itemProduce->setEnabled(login.loggedIn);
     m_itemPrint->setEnabled(login.loggedIn);
 }
 
@@ -327,23 +360,41 @@ void MainWindow::login(const QString &userName, const QString &password)
         return;
     }
     m_lblLoggedIn->setText(u"Welcome, "_s + m_context.loginState().currentUser);
-    m_lblActiveUsers->setText(*count + u" users are logged in"_s);
+    m_lblActiveUsers->setText(UserCounter::loggedInText(*count));
     updateLoginState();
     selectTab(TabViewBuilder::SummaryTab);
 }
 
-void MainWindow::logoff(bool reset)
+bool MainWindow::logoff(bool reset)
 {
-    LoginSession(m_context).logoff(reset);
+    if (!LoginSession(m_context).logoff(reset))
+        return false;
     if (!reset)
-        return;
+        return true;
+    // The next user sees nothing of this one's session.
+    closeSessionWindows();
+    m_tabView->clear();
     updateLoginState();
     m_lstUsers->clearEditText();
     m_txtPassword->clear();
     m_lblLoggedIn->clear();
     m_lblActiveUsers->clear();
+    m_lblToDate->clear();
     loadUserList(false);
     m_lstUsers->setFocus();
+    return true;
+}
+
+void MainWindow::closeSessionWindows()
+{
+    // The innermost first: a print window may stand over the comparison window.
+    const QList<QDialog *> dialogs = findChildren<QDialog *>();
+    for (auto it = dialogs.crbegin(); it != dialogs.crend(); ++it) {
+        QDialog *dialog = *it;
+        if (dialog->isVisible() &&
+            (qobject_cast<CompareWindow *>(dialog) || qobject_cast<PrintWindow *>(dialog)))
+            dialog->reject();
+    }
 }
 
 void MainWindow::selectTab(int tab)
@@ -359,20 +410,60 @@ void MainWindow::showSelection(int firstMonth, int firstYear, int lastMonth, int
     m_lstYear1->setEditText(QString::number(firstYear));
     m_lstMonth2->setCurrentIndex(lastMonth - 1);
     m_lstYear2->setEditText(QString::number(lastYear));
+    m_typedYears.clear();
 }
 
 void MainWindow::produce()
 {
+    if (!checkYears())
+        return;
     const ProduceCommand::Selection selection{
         m_lstMonth1->currentIndex() + 1, m_lstYear1->currentText().toInt(),
         m_lstMonth2->currentIndex() + 1, m_lstYear2->currentText().toInt()};
     if (ProduceCommand(m_context).produce(selection) != ProduceCommand::Outcome::Produced)
         return;
     selectTab(m_currentTab);
+    updateToDateNote();
     if (m_chkCompare->isChecked()) {
-        CompareWindow::compareData(m_context, this, m_lstCompareType->currentText(),
-                                   m_lstCompareCount->currentText().toInt());
+        // The kinds by their own names, whatever the list says for one period.
+        CompareWindow::compareData(
+            m_context, this, m_lstCompareType->currentIndex() == 0 ? u"Years"_s : u"Periods"_s,
+            m_lstCompareCount->currentText().toInt());
     }
+}
+
+void MainWindow::updateToDateNote()
+{
+    const QDate end = m_context.periodDataSet().range(0).end;
+    const bool beyondToday = end.isValid() && end > m_context.clock().today();
+    m_lblToDate->setText(beyondToday ? u"Figures for "_s + GridReport::reportTitle(m_context)
+                                     : QString());
+}
+
+bool MainWindow::checkYears()
+{
+    for (QComboBox *box : {m_lstYear1, m_lstYear2}) {
+        if (isRefusable(box)) {
+            refuseYear(box);
+            return false;
+        }
+    }
+    return true;
+}
+
+bool MainWindow::isRefusable(const QComboBox *box) const
+{
+    return m_typedYears.contains(box) &&
+           !RangeSelection::isValidYear(box->currentText(), m_context.settings().currentYear);
+}
+
+void MainWindow::refuseYear(QComboBox *box)
+{
+    m_refusedYears.insert(box, box->currentText());
+    m_prompter.message(RangeSelection::invalidYearMessage(m_context.settings().currentYear),
+                       RangeSelection::InvalidYearTitle, Prompter::Icon::Exclamation);
+    box->setFocus(Qt::OtherFocusReason);
+    box->lineEdit()->selectAll();
 }
 
 void MainWindow::print()
@@ -395,6 +486,8 @@ void MainWindow::step(
     const std::function<std::optional<ProduceCommand::Selection>(const ProduceCommand::Selection &)>
         &next)
 {
+    if (!checkYears())
+        return;
     const std::optional<ProduceCommand::Selection> stepped =
         next(selectionOf(m_lstMonth1, m_lstYear1, m_lstMonth2, m_lstYear2));
     if (!stepped) {
@@ -438,10 +531,11 @@ void MainWindow::pollUsers()
         return;
     const UserPoll::Result result =
         m_poll.tick(ConfigValues(m_context.mainDatabase(), m_prompter), m_context.isBusy());
-    m_lblActiveUsers->setText(result.activeUsers + u" users are logged in"_s);
+    m_lblActiveUsers->setText(UserCounter::loggedInText(result.activeUsers));
     switch (result.action) {
     case UserPoll::Action::Logoff:
-        logoff(true);
+        if (!logoff(true))
+            break;
         tellLater(u"You have been logged off due to a network request that requires all users "
                   u"to logoff!"_s);
         break;
@@ -485,8 +579,9 @@ void MainWindow::resetUserCounter()
 
 QString MainWindow::clockText(const QDateTime &moment)
 {
-    return QLocale(QLocale::English, QLocale::Australia)
-        .toString(moment, u"dddd, d MMM yyyy h:mm AP"_s);
+    // English names whatever the region; the C locale's month abbreviations are the three
+    // letters the clock has room for ("Sep", not "Sept").
+    return QLocale::c().toString(moment, u"dddd, d MMM yyyy h:mm AP"_s);
 }
 
 void MainWindow::updateClock()
@@ -508,12 +603,18 @@ bool MainWindow::eventFilter(QObject *watched, QEvent *event)
             QTimer::singleShot(0, m_txtPassword, &QLineEdit::selectAll);
     }
     if (event->type() == QEvent::FocusOut && (watched == m_lstYear1 || watched == m_lstYear2)) {
-        auto *box = static_cast<QComboBox *>(watched);
-        const int currentYear = m_context.settings().currentYear;
-        if (!RangeSelection::isValidYear(box->currentText(), currentYear)) {
-            m_prompter.message(RangeSelection::invalidYearMessage(currentYear),
-                               RangeSelection::InvalidYearTitle, Prompter::Icon::Exclamation);
-            QTimer::singleShot(0, box, [box] { box->setFocus(); });
+        // Only the user moving on inside the window leaves the box: another application, a
+        // menu or a message taking the focus does not, and every command checks the years.
+        const Qt::FocusReason reason = static_cast<QFocusEvent *>(event)->reason();
+        if (reason == Qt::TabFocusReason || reason == Qt::BacktabFocusReason ||
+            reason == Qt::MouseFocusReason) {
+            auto *box = static_cast<QComboBox *>(watched);
+            // Looked at once the click or key has done its work, so that a command it ran and
+            // refused the year for is not followed by the same message again.
+            QTimer::singleShot(0, box, [this, box] {
+                if (isRefusable(box) && m_refusedYears.value(box) != box->currentText())
+                    refuseYear(box);
+            });
         }
     }
     return QMainWindow::eventFilter(watched, event);

@@ -4,7 +4,9 @@
 #include "engine/producecommand.h"
 #include "users/userpoll.h"
 
+#include <QHash>
 #include <QMainWindow>
+#include <QSet>
 
 #include <functional>
 #include <optional>
@@ -32,7 +34,8 @@ public:
     MainWindow(AppContext &context, Prompter &prompter, QWidget *parent = nullptr);
 
     void login(const QString &userName, const QString &password);
-    void logoff(bool reset);
+    // False when the log-off could not be recorded (reported); the session then goes on.
+    bool logoff(bool reset);
     void produce();
     void print();
     void stepPreviousMonth();
@@ -62,6 +65,8 @@ public:
     QLabel *lblLoggedIn() const { return m_lblLoggedIn; }
     QLabel *lblActiveUsers() const { return m_lblActiveUsers; }
     QLabel *lblDT() const { return m_lblDT; }
+    QLabel *lblToDate() const { return m_lblToDate; }
+    QAction *itemProduce() const { return m_itemProduce; }
     QAction *itemLogoff() const { return m_itemLogoff; }
     QAction *itemPrint() const { return m_itemPrint; }
     QAction *itemSetupHours() const { return m_itemSetupHours; }
@@ -87,12 +92,25 @@ private:
               std::optional<ProduceCommand::Selection>(const ProduceCommand::Selection &)> &next);
     void updateClock();
     void tellLater(const QString &text);
+    void updateToDateNote();
+    // Typed years are checked before a command uses them; false after saying which is wrong.
+    bool checkYears();
+    bool isRefusable(const QComboBox *box) const;
+    void refuseYear(QComboBox *box);
+    // The comparison and print windows show the session's lines; they close with it.
+    void closeSessionWindows();
 
     AppContext &m_context;
     Prompter &m_prompter;
     UserPoll m_poll;
     int m_currentTab = 0;
     bool m_deletingUserName = false;
+    // The year boxes whose text the user typed. Only typed years are checked: the year
+    // buttons may choose the year after the current one as the end of a financial year.
+    QSet<const QComboBox *> m_typedYears;
+    // The invalid text each year box was last refused for, so that leaving it again is not
+    // refused again: the user is told once and never held in the box.
+    QHash<const QComboBox *, QString> m_refusedYears;
 
     QStackedWidget *m_pages = nullptr;
     QWidget *m_picLogin = nullptr;
@@ -111,6 +129,8 @@ private:
     QLabel *m_lblLoggedIn = nullptr;
     QLabel *m_lblActiveUsers = nullptr;
     QLabel *m_lblDT = nullptr;
+    QLabel *m_lblToDate = nullptr;
+    QAction *m_itemProduce = nullptr;
     QAction *m_itemLogoff = nullptr;
     QAction *m_itemPrint = nullptr;
     QAction *m_menuSetup = nullptr;

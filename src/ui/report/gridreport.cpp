@@ -22,7 +22,8 @@ namespace GridReport {
 QString reportTitle(AppContext &context)
 {
     const PeriodDataSet::Range range = context.periodDataSet().range(0);
-    return GridHtml::reportTitle(range.start, range.end, context.numberFormat().locale());
+    return GridHtml::reportTitle(range.start, range.end, context.numberFormat().locale(),
+                                 context.clock().today());
 }
 
 QString graphPicture(AppContext &context, KpiTabView &view)

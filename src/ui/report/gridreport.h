@@ -12,7 +12,8 @@ class QWidget;
 // graph below it when the graph is showing, opened in the print window.
 namespace GridReport {
 
-// "1/7/25 to 30/6/26": the produced range in the region's short date form.
+// "1/7/25 to 30/6/26": the produced range in the region's short date form; a range that ends
+// after today says how far its figures go: "1/7/26 to 30/6/27 (to date: 7 Dec 2026)".
 QString reportTitle(AppContext &context);
 // The picture of the view's graph in the temporary bitmap when the view shows its graph (the
 // Summary tab); empty on other tabs or when the picture could not be made (said so).

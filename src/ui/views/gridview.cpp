@@ -99,9 +99,15 @@ void GridView::fitColumn()
 {
     if (!m_gridAlive || m_fittedColumn < 1 || m_fittedColumn > m_grid.columnCount())
         return;
-    // The viewport already leaves out the scroll bar and the frame.
+    // The viewport already leaves out the scroll bar and the frame; columns widened beyond
+    // the grid's widths for their contents take their extra from the fitted column.
+    int widened = 0;
+    for (int c = 1; c <= m_grid.columnCount(); ++c) {
+        if (c != m_fittedColumn && !isColumnHidden(c - 1))
+            widened += std::max(0, columnWidth(c - 1) - m_grid.column(c).width);
+    }
     const int width =
-        GridOperations::fitColumn(m_grid, m_fittedColumn, viewport()->width(), 0, false);
+        GridOperations::fitColumn(m_grid, m_fittedColumn, viewport()->width() - widened, 0, false);
     setColumnWidth(m_fittedColumn - 1, width);
 }
 
@@ -116,8 +122,14 @@ void GridView::applyLayout()
         return;
     for (int c = 1; c <= m_grid.columnCount(); ++c) {
         const GridModel::Column &column = m_grid.column(c);
-        setColumnHidden(c - 1, !column.visible || column.width == 0);
-        setColumnWidth(c - 1, column.width);
+        const bool hidden = !column.visible || column.width == 0;
+        setColumnHidden(c - 1, hidden);
+        // No value is ever cut short: a column is at least as wide as its widest cell and its
+        // header, whatever width the grid gives it.
+        const bool fitsContents = !hidden && c != m_fittedColumn;
+        setColumnWidth(c - 1, fitsContents ? std::max({column.width, sizeHintForColumn(c - 1),
+                                                       horizontalHeader()->sectionSizeHint(c - 1)})
+                                           : column.width);
     }
     for (int r = 1; r <= m_grid.rowCount(); ++r)
         setRowHidden(r - 1, !m_grid.isRowVisible(r));

@@ -78,6 +78,14 @@ void KpiTabView::showTab(int tab)
     m_graph->setVisible(tab == TabViewBuilder::SummaryTab);
 }
 
+void KpiTabView::clear()
+{
+    m_grid.clear();
+    m_graph->setBars({}, m_pastCount > 0, m_pastCount + 1);
+    m_tooltip->hide();
+    m_caption->clear();
+}
+
 void KpiTabView::selectField(qint64 fieldId)
 {
     m_grid.setSelectedRow(GridOperations::findGridRow(m_grid, 1, QString::number(fieldId)));

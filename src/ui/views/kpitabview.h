@@ -25,6 +25,8 @@ public:
 
     // Rebuilds the grid for the tab, and the graph on the Summary tab.
     void showTab(int tab);
+    // Shows nothing: no rows, no bars, no explanation.
+    void clear();
     int currentTab() const { return m_tab; }
     int pastCount() const { return m_pastCount; }
 

@@ -24,6 +24,7 @@ private Q_SLOTS:
     void checksInOrder_data();
     void checksInOrder();
     void savesEverythingWithThePasswordEnciphered();
+    void passwordOutsideTheCodePageIsRefused();
     void pathEndingInSlashIsKept();
     void unknownPackageIsWrittenBackAsItWas();
     void emptyStoreLoadsEmptyValues();
@@ -119,6 +120,20 @@ void TestSystemConfiguration::savesEverythingWithThePasswordEnciphered()
     QVERIFY(QFile::copy(QStringLiteral(VELTRIX_NEW_DB), workspace.appFolder() + u"new.db"_s));
     QCOMPARE(loadSettings(workspace.context()), QString());
     QCOMPARE(workspace.context().settings().accFilePass, u"Sp@nner 7"_s);
+}
+
+void TestSystemConfiguration::passwordOutsideTheCodePageIsRefused()
+{
+    TestWorkspace workspace;
+    SystemConfiguration configuration(workspace.store(), workspace.prompter());
+    SystemConfiguration::Values values{
+        workspace.sharedFolder(), u"MoneyWorks"_s, {}, {}, {}, u"Zło?ty"_s};
+    QVERIFY(!configuration.save(values));
+    QCOMPARE(workspace.prompter().messages().value(0).title, u"Invalid Password"_s);
+    QVERIFY(workspace.prompter().messages().value(0).text.contains(u"\"ł\""_s));
+    QCOMPARE(workspace.store().readSetting(u"AccPackage"_s), QString());
+    values.password = u"Grüße €5"_s; // the Western European page holds these
+    QVERIFY(configuration.save(values));
 }
 
 void TestSystemConfiguration::pathEndingInSlashIsKept()

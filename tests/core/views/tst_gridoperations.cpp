@@ -68,7 +68,11 @@ void TestGridOperations::sortsByType()
     GridModel grid;
     grid.addColumn(u"id"_s, QString(), 0, 10, true);
     grid.addColumn(u"name"_s, QString(), 0, 10, true);
-    addRows(grid, {{u"10"_s, u"bob"_s}, {u"9"_s, u"Anna"_s}, {u"100"_s, u"carl"_s}});
+    grid.addColumn(u"datecreated"_s, QString(), 0, 10, true);
+    // Dates as the program writes them, in an order that text comparison gets wrong.
+    addRows(grid, {{u"10"_s, u"bob"_s, u"30 Jan 2027 10:00 AM"_s},
+                   {u"9"_s, u"Anna"_s, u"5 Dec 2026 9:05 AM"_s},
+                   {u"100"_s, u"carl"_s, u"5 Dec 2026 8:59 PM"_s}});
     setupGrid(grid);
     grid.setSelectedRow(1); // bob
     sortGrid(grid, 1, true);
@@ -80,6 +84,9 @@ void TestGridOperations::sortsByType()
     QCOMPARE(grid.cellText(1, 2), u"carl"_s);
     QCOMPARE(grid.cellText(3, 2), u"Anna"_s);
     QCOMPARE(grid.column(2).tag, QString());
+    sortGrid(grid, 3, true);
+    QCOMPARE(grid.cellText(1, 2), u"Anna"_s);
+    QCOMPARE(grid.cellText(2, 2), u"carl"_s);
 }
 
 void TestGridOperations::formatSetupList()

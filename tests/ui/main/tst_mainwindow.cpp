@@ -3,17 +3,24 @@
 #include "testworkspace.h"
 
 #include "app/demoworkspace.h"
+#include "app/fileoperations.h"
 #include "app/settingsloader.h"
 #include "database/configvalues.h"
 #include "database/mainconnector.h"
 #include "main/mainwindow.h"
+#include "report/gridreport.h"
+#include "report/printwindow.h"
 #include "setup/celleditor.h"
 #include "setup/hourlyratesdialog.h"
 #include "setup/programsetupdialog.h"
+#include "views/bargraphitem.h"
+#include "views/comparewindow.h"
+#include "views/grapharea.h"
 #include "views/gridmodel.h"
 #include "views/gridview.h"
 #include "views/kpitabview.h"
 
+#include <QCheckBox>
 #include <QComboBox>
 #include <QDialog>
 #include <QJsonArray>
@@ -24,6 +31,7 @@
 #include <QMenu>
 #include <QProcess>
 #include <QPushButton>
+#include <QRegularExpression>
 #include <QSqlQuery>
 #include <QTest>
 
@@ -41,7 +49,8 @@ private Q_SLOTS:
     void failedLogin();
     void stepButtons_data();
     void stepButtons();
-    void invalidYear();
+    void yearIsCheckedBeforeUse_data();
+    void yearIsCheckedBeforeUse();
     void resetCounterLogsEveryWindowOff();
     void clockFormat();
     void typeAheadCompletesNames();
@@ -49,6 +58,7 @@ private Q_SLOTS:
     void shutdownRequestEndsTheProgramUnderADialog();
     void logoffRequestIsWithdrawnWhileItsBoxIsOpen();
     void produceShowsTheDemoFigures();
+    void nextUserSeesNothingOfTheLast();
     void setupMenuFollowsTheUser_data();
     void setupMenuFollowsTheUser();
     void mappingAndRatesReachTheNextProduce();
@@ -90,7 +100,8 @@ private:
 
 void TestMainWindow::init()
 {
-    m_workspace = std::make_unique<TestWorkspace>();
+    m_workspace = std::make_unique<TestWorkspace>(
+        Clock::fixedAt(QDateTime(QDate(2026, 12, 7), QTime(10, 0))));
     QVERIFY(m_workspace->configure());
 }
 
@@ -106,8 +117,15 @@ void TestMainWindow::loginInAnyCaseGreetsTheStoredName()
     addUser(*m_workspace, u"bob"_s);
     window->login(u"Bob"_s, u"pw"_s);
     QCOMPARE(window->lblLoggedIn()->text(), u"Welcome, bob"_s);
-    QCOMPARE(window->lblActiveUsers()->text(), u"1 users are logged in"_s);
+    QCOMPARE(window->lblActiveUsers()->text(), u"1 user is logged in"_s);
     QVERIFY(!window->menuSetup()->isEnabled());
+    // A log-off the database cannot record leaves the session as it was.
+    QSqlQuery sql(m_workspace->context().mainDatabase().database());
+    QVERIFY(sql.exec(u"ALTER TABLE Config RENAME TO Gone"_s));
+    QVERIFY(!window->logoff(true));
+    QVERIFY(m_workspace->prompter().messages().last().title.startsWith(u"Logoff Error"_s));
+    QCOMPARE(window->lblActiveUsers()->text(), u"1 user is logged in"_s);
+    QVERIFY(sql.exec(u"ALTER TABLE Gone RENAME TO Config"_s));
     window->logoff(true);
     QCOMPARE(ConfigValues(m_workspace->context().mainDatabase(), m_workspace->prompter())
                  .getConfigValue(4),
@@ -125,6 +143,9 @@ void TestMainWindow::builtInAccountWithNoUsers()
     window->login(u"sysop"_s, u"sysop"_s);
     QVERIFY(window->menuSetup()->isEnabled());
     QCOMPARE(window->lblActiveUsers()->text(), u"0 users are logged in"_s);
+    QCOMPARE(window->lstCompareType()->itemText(0), u"Year"_s); // "The Past 1 Year"
+    window->lstCompareCount()->setCurrentIndex(1);
+    QCOMPARE(window->lstCompareType()->itemText(1), u"Periods"_s);
 }
 
 void TestMainWindow::failedLogin()
@@ -185,22 +206,55 @@ void TestMainWindow::stepButtons()
     QCOMPARE(window->lstYear2()->currentText(), to[3]);
 }
 
-void TestMainWindow::invalidYear()
+void TestMainWindow::yearIsCheckedBeforeUse_data()
 {
+    QTest::addColumn<QString>("year"); // typed into the first year box
+    QTest::addColumn<QString>("action");
+    QTest::addColumn<QString>("title"); // of the one message shown; empty for none
+    const QString produced = u"Cannot Produce KPI's"_s;
+    QTest::newRow("F5 produces") << u"2005"_s << u"F5"_s << produced;
+    QTest::newRow("Ctrl+Return produces") << u"2005"_s << u"Ctrl+Return"_s << produced;
+    QTest::newRow("F5 with 1949") << u"1949"_s << u"F5"_s << u"Invalid Year"_s;
+    QTest::newRow("menu with 19") << u"19"_s << u"menu"_s << u"Invalid Year"_s;
+    QTest::newRow("step button with 1949") << u"1949"_s << u"step"_s << u"Invalid Year"_s;
+    QTest::newRow("Tab out of 1949 twice") << u"1949"_s << u"Tab"_s << u"Invalid Year"_s;
+    QTest::newRow("another application takes the focus") << u"1949"_s << u"away"_s << QString();
+}
+
+void TestMainWindow::yearIsCheckedBeforeUse()
+{
+    QFETCH(QString, year);
+    QFETCH(QString, action);
+    QFETCH(QString, title);
     auto window = openWindow(*m_workspace);
     QVERIFY(window);
     window->show();
-    QVERIFY(QTest::qWaitForWindowExposed(window.get()));
+    QVERIFY(QTest::qWaitForWindowActive(window.get()));
     window->login(u"sysop"_s, u"sysop"_s);
+    QComboBox *box = window->lstYear1();
+    box->setFocus();
+    box->lineEdit()->selectAll();
+    QTest::keyClicks(box, year);
+    QTest::keyClick(box, Qt::Key_Return);
+    QCOMPARE(box->count(), 21); // a typed year is not added to the list
     m_workspace->prompter().clearMessages();
-    window->lstYear1()->setFocus();
-    QTRY_VERIFY(window->lstYear1()->hasFocus());
-    window->lstYear1()->setEditText(u"1949"_s);
-    window->lstMonth1()->setFocus();
-    QTRY_COMPARE(m_workspace->prompter().messages().size(), 1);
-    const RecordingPrompter::Message &message = m_workspace->prompter().messages().first();
-    QCOMPARE(message.title, u"Invalid Year"_s);
-    QVERIFY(message.text.endsWith(QString::number(m_workspace->context().settings().currentYear)));
+    QFocusEvent away(QEvent::FocusOut, Qt::ActiveWindowFocusReason);
+    if (action == u"menu"_s)
+        window->itemProduce()->trigger();
+    else if (action == u"step"_s)
+        window->stepPreviousYear();
+    else if (action == u"away"_s)
+        QApplication::sendEvent(box, &away);
+    else if (action == u"Tab"_s) { // told once, the user may then leave
+        QTest::keyClick(box, Qt::Key_Tab);
+        QTRY_VERIFY(box->hasFocus());
+        QTest::keyClick(box, Qt::Key_Tab);
+    } else
+        QTest::keySequence(window.get(), QKeySequence(action));
+    QTest::qWait(20);
+    QCOMPARE(m_workspace->prompter().messages().size(), title.isEmpty() ? 0 : 1);
+    QCOMPARE(m_workspace->prompter().messages().value(0).title, title);
+    QCOMPARE(box->hasFocus(), action != u"Tab"_s);
 }
 
 void TestMainWindow::resetCounterLogsEveryWindowOff()
@@ -228,6 +282,10 @@ void TestMainWindow::clockFormat()
              u"Saturday, 5 Dec 2026 9:05 AM"_s);
     QCOMPARE(MainWindow::clockText(QDateTime(QDate(2026, 12, 5), QTime(21, 30))),
              u"Saturday, 5 Dec 2026 9:30 PM"_s);
+    QCOMPARE(MainWindow::clockText(QDateTime(QDate(2026, 6, 1), QTime(14, 0))),
+             u"Monday, 1 Jun 2026 2:00 PM"_s);
+    QCOMPARE(MainWindow::clockText(QDateTime(QDate(2026, 9, 1), QTime(0, 7))),
+             u"Tuesday, 1 Sep 2026 12:07 AM"_s);
 }
 
 void TestMainWindow::typeAheadCompletesNames()
@@ -335,6 +393,73 @@ void TestMainWindow::produceShowsTheDemoFigures()
     // The same text veltrix-cli produce prints for this line and range.
     QCOMPARE(grid.cellText(2, grid.columnIndex(u"value"_s)), u"48.2%"_s);
     QCOMPARE(m_workspace->store().readSetting(u"M1"_s), u"6"_s);
+    QCOMPARE(window->lblToDate()->text(), QString());
+    // No figure is cut short ("$ …"), not even the widest of the Financial tab.
+    window->selectTab(6);
+    const GridView *view = window->tabView()->lstGrid();
+    const int value = grid.columnIndex(u"value"_s) - 1;
+    for (int r = 0; r < grid.rowCount(); ++r)
+        QVERIFY(view->sizeHintForIndex(view->model()->index(r, value)).width() <=
+                view->columnWidth(value));
+    // July 2026 to June 2027 has not ended on 7 Dec 2026.
+    window->stepFollowingYear();
+    const QString title = u"1/7/26 to 30/6/27 (to date: 7 Dec 2026)"_s;
+    QCOMPARE(GridReport::reportTitle(m_workspace->context()), title);
+    QCOMPARE(window->lblToDate()->text(), u"Figures for "_s + title);
+}
+
+void TestMainWindow::nextUserSeesNothingOfTheLast()
+{
+    QTemporaryDir dir;
+    auto window = openOnDemo(dir.filePath(u"demo"_s));
+    QVERIFY(window);
+    window->show();
+    // Workshop may see the Summary tab but for one percentage line.
+    QSqlQuery query(m_workspace->context().mainDatabase().database());
+    QVERIFY(query.exec(u"SELECT ID, Label FROM Fields WHERE Tab = 1 AND Type = 3 ORDER BY ID"_s) &&
+            query.next());
+    const QString line = query.value(0).toString();
+    const QString label = query.value(1).toString();
+    QVERIFY(query.exec(u"SELECT Fields FROM Users WHERE UserName = 'workshop'"_s) && query.next());
+    QStringList allowed = query.value(0).toString().split(QRegularExpression(u"[#,]"_s));
+    QVERIFY(allowed.removeAll(line) == 1);
+    QVERIFY(query.exec(
+        u"UPDATE Users SET Fields = '%1' WHERE UserName = 'workshop'"_s.arg(allowed.join(u','))));
+    QVERIFY(query.exec(u"SELECT ID FROM Fields WHERE Type = 1"_s));
+    while (query.next())
+        allowed << query.value(0).toString(); // headings are not lines
+    const auto showsOnlyAllowed = [&](KpiTabView &view) {
+        for (int r = 1; r <= view.grid().rowCount(); ++r)
+            QVERIFY(view.lstGrid()->isRowHidden(r - 1) ||
+                    allowed.contains(view.grid().cellText(r, 1)));
+        for (const BarGraphItem *bar : view.picGraph()->bars())
+            QVERIFY(allowed.contains(QString::number(bar->tag())));
+    };
+
+    // Manager compares; a network request logs everyone off while the comparison is open.
+    window->login(u"manager"_s, u"manager1"_s);
+    window->chkCompare()->setChecked(true);
+    whenModalOpens<CompareWindow>([&](CompareWindow &compare) {
+        QTRY_VERIFY_WITH_TIMEOUT(!compare.isLoading(), 60000);
+        QVERIFY(!ConfigValues(m_workspace->context().mainDatabase(), m_workspace->prompter())
+                     .setConfigValue(5, u"Logoff"_s));
+        window->pollUsers();
+        QVERIFY(!compare.isVisible());
+    });
+    window->produce();
+
+    window->login(u"workshop"_s, u"panel1"_s);
+    showsOnlyAllowed(*window->tabView());
+    whenModalOpens<PrintWindow>([&](PrintWindow &) {
+        QVERIFY(!FileOperations::readTextFile(m_workspace->context().settings().tempHtmlFile)
+                     .contains(u"'>"_s + label + u"</td>"_s));
+    });
+    window->print();
+    whenModalOpens<CompareWindow>([&](CompareWindow &compare) {
+        QTRY_VERIFY_WITH_TIMEOUT(!compare.isLoading(), 60000);
+        showsOnlyAllowed(*compare.tabView());
+    });
+    window->produce();
 }
 
 void TestMainWindow::setupMenuFollowsTheUser_data()

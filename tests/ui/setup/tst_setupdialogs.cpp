@@ -134,11 +134,12 @@ void TestSetupDialogs::rateEdits_data()
     QTest::addColumn<QString>("typed");
     QTest::addColumn<QString>("shown");
     QTest::addColumn<double>("saved");
-    QTest::newRow("decimal") << u"1234.5"_s << u"1,234.50"_s << 1234.5;
-    QTest::newRow("grouped") << u"1,100"_s << u"1,100.00"_s << 1100.0;
-    QTest::newRow("zero") << u"0"_s << u"0.00"_s << 0.0;
-    QTest::newRow("letters") << u"abc"_s << u"0"_s << 0.0;
-    QTest::newRow("empty") << QString() << u"0"_s << 0.0;
+    QTest::addColumn<QString>("message"); // its title
+    QTest::newRow("decimal") << u"1234.5"_s << u"1,234.50"_s << 1234.5 << QString();
+    QTest::newRow("grouped") << u"1,100"_s << u"1,100.00"_s << 1100.0 << QString();
+    QTest::newRow("zero") << u"0"_s << u"0.00"_s << 0.0 << QString();
+    QTest::newRow("letters keep the rate") << u"abc"_s << u"65.00"_s << 65.0 << u"Invalid Rate"_s;
+    QTest::newRow("empty clears it") << QString() << u"0.00"_s << 0.0 << QString();
 }
 
 void TestSetupDialogs::rateEdits()
@@ -146,6 +147,7 @@ void TestSetupDialogs::rateEdits()
     QFETCH(QString, typed);
     QFETCH(QString, shown);
     QFETCH(double, saved);
+    QFETCH(QString, message);
     QVERIFY(connect());
     OtherCopy(m_workspace->mainDatabase()).exec(u"UPDATE Hours SET Value = 65 WHERE ID = 1"_s);
     HourlyRatesDialog dialog(m_workspace->context());
@@ -165,12 +167,14 @@ void TestSetupDialogs::rateEdits()
     dialog.butOK()->click();
     QVERIFY(!dialog.isVisible());
     QCOMPARE(stored(u"SELECT Value FROM Hours WHERE ID = 1"_s).toDouble(), saved);
-    QVERIFY(m_workspace->prompter().messages().isEmpty());
+    QCOMPARE(m_workspace->prompter().messages().value(0).title, message);
 }
 
 void TestSetupDialogs::escapeKeepsTheRate()
 {
     QVERIFY(connect());
+    // A rate nobody edits is kept exactly, though the list shows it rounded.
+    OtherCopy(m_workspace->mainDatabase()).exec(u"UPDATE Hours SET Value = 65.125 WHERE ID = 1"_s);
     HourlyRatesDialog dialog(m_workspace->context());
     dialog.show();
     clickCell(dialog.lstRates(), 2, 3);
@@ -179,6 +183,7 @@ void TestSetupDialogs::escapeKeepsTheRate()
     QCOMPARE(dialog.rates().grid().cellText(2, 3), u"0.00"_s);
     dialog.butOK()->click();
     QCOMPARE(stored(u"SELECT Value FROM Hours WHERE ID = 2"_s).toDouble(), 0.0);
+    QCOMPARE(stored(u"SELECT Value FROM Hours WHERE ID = 1"_s).toDouble(), 65.125);
 }
 
 void TestSetupDialogs::typedKeyOpensTheBoxAndArrowsMove()
