@@ -140,8 +140,36 @@ void TestSettingsLoader::derivesProgramPaths()
     QCOMPARE(settings.tempHtmlFile, settings.tempFolder + u"tmp.html"_s);
     QCOMPARE(settings.tempGifFile, settings.tempFolder + u"tmp.gif"_s);
     QCOMPARE(settings.tempBmpFile, settings.tempFolder + u"tmp.bmp"_s);
+    QCOMPARE(settings.jobsFile, appFolder() + u"jobs.inf"_s);
     // The program folder is made on first start, and the temporary folder in it.
     QVERIFY(QFileInfo(settings.tempFolder).isDir());
+
+    // A second copy on the same folder while this one runs (a lock is held per process, so a
+    // second holder here stands for a second process), and any command-line run, keep their
+    // working files apart from it and from each other.
+    auto second = makeContext();
+    AppLocations commandLine = AppLocations::inFolder(appFolder());
+    commandLine.privateWorkingFiles = true;
+    AppContext headless(std::make_unique<SettingsStore>(m_root->filePath(u"settings.ini"_s)),
+                        m_prompter, commandLine);
+    QStringList folders{settings.tempFolder};
+    for (AppContext *other : {second.get(), &headless}) {
+        loadSettings(*other);
+        const Settings &own = other->settings();
+        QVERIFY(!folders.contains(own.tempFolder));
+        QVERIFY(!own.jobsFile.startsWith(appFolder()));
+        QCOMPARE(own.tempFolder, QFileInfo(own.jobsFile).path() + u"/temp"_s + QDir::separator());
+        QVERIFY(QFileInfo(own.tempFolder).isDir());
+        QVERIFY(other->workingFolder().isPrivate());
+        folders << own.tempFolder;
+    }
+    // A private folder goes when its run lets go of it; the program folder's lock is free again.
+    second->workingFolder().release();
+    QVERIFY(!QFileInfo::exists(folders[1]));
+    m_context->workingFolder().release();
+    auto next = makeContext();
+    loadSettings(*next);
+    QCOMPARE(next->settings().tempFolder, settings.tempFolder);
 }
 
 void TestSettingsLoader::databasePathIsTrimmed()
