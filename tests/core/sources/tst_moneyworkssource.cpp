@@ -10,6 +10,7 @@
 #include "sources/restmoneyworkslink.h"
 
 #include <QNetworkReply>
+#include <QRandomGenerator>
 #include <QSqlQuery>
 #include <QTcpServer>
 #include <QTcpSocket>
@@ -42,42 +43,26 @@ public:
     }
 };
 
-// A server that gives the document's name to the check that opens it and one fixed answer to
-// everything else, as a broken or hostile server might.
-class FixedAnswerServer : public QTcpServer
+// Gives the document's name to the check that opens it and the same reply to everything
+// else, as a broken or hostile server might.
+void answerNonsense(QTcpServer &server, const QByteArray &headers, const QByteArray &body)
 {
-public:
-    QByteArray headers;
-    QByteArray body;
-
-    FixedAnswerServer()
-    {
-        connect(this, &QTcpServer::newConnection, this, [this] {
-            while (QTcpSocket *socket = nextPendingConnection())
-                answer(socket);
-        });
-    }
-
-private:
-    void answer(QTcpSocket *socket)
-    {
-        connect(socket, &QTcpSocket::disconnected, socket, &QObject::deleteLater);
-        connect(socket, &QTcpSocket::readyRead, socket, [this, socket] {
-            const QByteArray request =
-                socket->property("request").toByteArray() + socket->readAll();
-            socket->setProperty("request", request);
-            if (!request.contains("\r\n\r\n"))
-                return;
+    QObject::connect(&server, &QTcpServer::newConnection, &server, [&server, headers, body] {
+        QTcpSocket *socket = server.nextPendingConnection();
+        QObject::connect(socket, &QTcpSocket::disconnected, socket, &QObject::deleteLater);
+        QObject::connect(socket, &QTcpSocket::readyRead, socket, [socket, headers, body] {
+            const QByteArray request = socket->peek(socket->bytesAvailable());
             const bool opening = request.contains("/evaluate/expr=DocumentPath ");
             const QByteArray content = opening ? QUrl::toPercentEncoding(Document) : body;
-            socket->write(
-                "HTTP/1.1 200 OK\r\nContent-Length: " + QByteArray::number(content.size()) +
-                "\r\n" + (opening ? QByteArray() : headers) + "Connection: close\r\n\r\n" +
-                content);
-            socket->disconnectFromHost();
+            if (request.contains("\r\n\r\n")) {
+                socket->write(
+                    "HTTP/1.1 200 OK\r\nContent-Length: " + QByteArray::number(content.size()) +
+                    "\r\n" + (opening ? QByteArray() : headers) + "\r\n" + content);
+                socket->disconnectFromHost();
+            }
         });
-    }
-};
+    });
+}
 
 } // namespace
 
@@ -394,9 +379,7 @@ void TestMoneyWorksSource::serverThatAnswersNonsense_data()
     QTest::addColumn<QByteArray>("body");
     QTest::addColumn<QStringList>("titles");
     QByteArray noise(4096, 0);
-    quint32 seed = 17;
-    for (char &byte : noise)
-        byte = char((seed = seed * 1103515245u + 12345u) >> 16);
+    QRandomGenerator(17).fillRange(reinterpret_cast<quint32 *>(noise.data()), 4096 / 4);
     const QStringList notAnswers{u"GetMWValue Error 13"_s, u"GetMWJobs Error 13"_s};
     const QStringList tooLarge{u"GetMWValue Error 7"_s, u"GetMWJobs Error 7"_s};
     QTest::newRow("random bytes") << QByteArray() << noise << notAnswers;
@@ -420,9 +403,8 @@ void TestMoneyWorksSource::serverThatAnswersNonsense()
     QFETCH(QByteArray, headers);
     QFETCH(QByteArray, body);
     QFETCH(QStringList, titles);
-    FixedAnswerServer server;
-    server.headers = headers;
-    server.body = body;
+    QTcpServer server;
+    answerNonsense(server, headers, body);
     QVERIFY(server.listen(QHostAddress::LocalHost));
     auto source = serverSource(QString(), QString(), server.serverPort());
     QCOMPARE(source->openDataFile(), std::nullopt);
