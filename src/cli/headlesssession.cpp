@@ -163,8 +163,11 @@ int Session::open(const Options &options)
     auto store = options.settingsFile.isEmpty()
                      ? std::make_unique<SettingsStore>()
                      : std::make_unique<SettingsStore>(options.settingsFile);
-    m_context =
-        std::make_unique<AppContext>(std::move(store), *m_prompter, AppLocations::forThisMachine());
+    // A scheduled run beside the desktop program, or beside another run, must never pick up
+    // their export or their graph: its working files are its own.
+    AppLocations locations = AppLocations::forThisMachine();
+    locations.privateWorkingFiles = true;
+    m_context = std::make_unique<AppContext>(std::move(store), *m_prompter, std::move(locations));
     const StartupOutcome startup = runStartupSequence(*m_context);
     if (startup.failed) {
         QTextStream(stderr) << startup.message << Qt::endl;

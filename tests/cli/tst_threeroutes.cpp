@@ -11,6 +11,7 @@
 #include "database/sqliteconnection.h"
 #include "sources/companyfile.h"
 
+#include <QCryptographicHash>
 #include <QDir>
 #include <QFile>
 #include <QProcess>
@@ -53,6 +54,7 @@ private Q_SLOTS:
     void initTestCase();
     void cleanupTestCase();
     void everyRouteGivesTheSameFigures();
+    void runsAtOnceKeepTheirOwnFiles();
 
 private:
     struct Run
@@ -62,6 +64,9 @@ private:
         QString err;
     };
     Run produce(const QString &settingsFile);
+    void start(QProcess &process, const QStringList &arguments);
+    static Run finish(QProcess &process);
+    QString moneyWorksSettings();
     bool loadLedgerIntoPostgres(QString *problem);
     QString writeSettings(const QString &name, const QHash<QString, QString> &changes);
 
@@ -193,18 +198,38 @@ QString TestThreeRoutes::writeSettings(const QString &name, const QHash<QString,
     return path;
 }
 
+QString TestThreeRoutes::moneyWorksSettings()
+{
+    return writeSettings(
+        u"moneyworks.ini"_s,
+        {{u"AccPackage"_s, u"MoneyWorks"_s},
+         {u"AccFilePath"_s, m_simulator.address(u"Harbour Panel & Paint.moneyworks"_s)},
+         {u"AccFileUser"_s, u"Admin"_s},
+         {u"AccFilePass"_s, PasswordCipher().encryptText(u"demo"_s, Settings::PasswordKey)}});
+}
+
+void TestThreeRoutes::start(QProcess &process, const QStringList &arguments)
+{
+    process.setProcessEnvironment(m_environment);
+    process.start(QStringLiteral(VELTRIX_CLI), arguments);
+}
+
 TestThreeRoutes::Run TestThreeRoutes::produce(const QString &settingsFile)
 {
     QProcess process;
-    process.setProcessEnvironment(m_environment);
     QStringList arguments{u"produce"_s, u"--settings"_s, settingsFile,  u"--user"_s,
                           u"manager"_s, u"--password"_s, u"manager1"_s, u"--compare"_s,
                           u"years"_s,   u"--count"_s,    u"2"_s};
     for (const QString &part : Range)
         arguments << part;
-    process.start(QStringLiteral(VELTRIX_CLI), arguments);
+    start(process, arguments);
+    return finish(process);
+}
+
+TestThreeRoutes::Run TestThreeRoutes::finish(QProcess &process)
+{
     Run run;
-    if (!process.waitForFinished(300000))
+    if (process.state() != QProcess::NotRunning && !process.waitForFinished(300000))
         return run;
     run.exitCode = process.exitCode();
     run.lines = QString::fromUtf8(process.readAllStandardOutput()).split(u'\n', Qt::SkipEmptyParts);
@@ -218,12 +243,7 @@ void TestThreeRoutes::everyRouteGivesTheSameFigures()
     const Run odbc = produce(writeSettings(u"odbc.ini"_s, {{u"AccFileDriver"_s, u"MYOAU0901"_s},
                                                            {u"AccFilePath"_s, u"veltrix"_s},
                                                            {u"AccFileUser"_s, u"postgres"_s}}));
-    const Run moneyWorks = produce(writeSettings(
-        u"moneyworks.ini"_s,
-        {{u"AccPackage"_s, u"MoneyWorks"_s},
-         {u"AccFilePath"_s, m_simulator.address(u"Harbour Panel & Paint.moneyworks"_s)},
-         {u"AccFileUser"_s, u"Admin"_s},
-         {u"AccFilePass"_s, PasswordCipher().encryptText(u"demo"_s, Settings::PasswordKey)}}));
+    const Run moneyWorks = produce(moneyWorksSettings());
 
     for (const Run *run : {&companyFile, &odbc, &moneyWorks}) {
         QVERIFY2(run->exitCode == 0, qPrintable(run->err));
@@ -241,6 +261,49 @@ void TestThreeRoutes::everyRouteGivesTheSameFigures()
         QCOMPARE(odbc.lines.at(i), companyFile.lines.at(i));
         QCOMPARE(moneyWorks.lines.at(i), companyFile.lines.at(i));
     }
+}
+
+void TestThreeRoutes::runsAtOnceKeepTheirOwnFiles()
+{
+    // Where the desktop program keeps its working files, another process's stand in the way: a
+    // run that used them could write neither its export nor its picture.
+    const QString desktopFolder = m_dir.filePath(u"data/veltrix/"_s);
+    QVERIFY(QDir().mkpath(desktopFolder + u"jobs.inf"_s));
+    QVERIFY(QDir().mkpath(desktopFolder + u"temp/tmp.bmp"_s));
+
+    // Two months with their own invoice counts and graphs, produced and reported: what each
+    // run gives (its exit code and lines, or its picture) alone and with the others at once.
+    const QString settings = moneyWorksSettings();
+    const auto runFour = [&](bool atOnce) {
+        QProcess runs[4];
+        QStringList outcomes;
+        for (int r = 0; r < 4; ++r) {
+            const QString month = r % 2 ? u"2025-08"_s : u"2025-07"_s;
+            const QString page = m_dir.filePath(u"report%1.html"_s.arg(r));
+            QFile::remove(m_dir.filePath(u"report%1.bmp"_s.arg(r)));
+            start(runs[r], QStringList{r < 2 ? u"produce"_s : u"report"_s, u"--settings"_s,
+                                       settings, u"--from"_s, month, u"--to"_s, month, u"--user"_s,
+                                       u"manager"_s, u"--password"_s, u"manager1"_s}
+                               << (r < 2 ? QStringList() : QStringList{u"--out"_s, page}));
+            if (!atOnce)
+                runs[r].waitForFinished(300000);
+        }
+        for (int r = 0; r < 4; ++r) {
+            const Run run = finish(runs[r]);
+            QFile picture(m_dir.filePath(u"report%1.bmp"_s.arg(r)));
+            const QByteArray drawn = picture.open(QIODevice::ReadOnly) ? picture.readAll() : "";
+            outcomes << u"exit %1 "_s.arg(run.exitCode) + run.err + run.lines.join(u'\n') +
+                            QString::fromLatin1(
+                                QCryptographicHash::hash(drawn, QCryptographicHash::Sha1).toHex());
+        }
+        return outcomes;
+    };
+    const QStringList alone = runFour(false);
+    for (const QString &outcome : alone)
+        QVERIFY2(outcome.startsWith(u"exit 0 "_s), qPrintable(outcome.left(400)));
+    QVERIFY(alone[0] != alone[1] && alone[2] != alone[3]);
+    for (int round = 0; round < 3; ++round)
+        QCOMPARE(runFour(true), alone);
 }
 
 QTEST_GUILESS_MAIN(TestThreeRoutes)

@@ -5,6 +5,7 @@
 #include "clock.h"
 #include "numberformat.h"
 #include "settings.h"
+#include "workingfolder.h"
 
 #include "database/maindatabase.h"
 #include "engine/perioddataset.h"
@@ -31,6 +32,7 @@ public:
     SettingsStore &settingsStore() { return *m_store; }
     Prompter &prompter() { return m_prompter; }
     const AppLocations &locations() const { return m_locations; }
+    WorkingFolder &workingFolder() { return m_workingFolder; }
     const Clock &clock() const { return m_clock; }
     const NumberFormat &numberFormat() const { return m_numberFormat; }
     void setNumberFormat(const NumberFormat &format) { m_numberFormat = format; }
@@ -77,6 +79,8 @@ private:
     std::unique_ptr<SettingsStore> m_store;
     Prompter &m_prompter;
     AppLocations m_locations;
+    WorkingFolder m_workingFolder{m_locations.privateWorkingFiles ? WorkingFolder::Kind::Private
+                                                                  : WorkingFolder::Kind::Shared};
     Clock m_clock;
     NumberFormat m_numberFormat;
     Settings m_settings;

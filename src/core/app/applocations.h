@@ -12,6 +12,9 @@ struct AppLocations
 {
     QString appFolder;                 // ends in a separator
     QStringList newDatabaseCandidates; // first existing one wins
+    // Working files (temporary folder, jobs.inf) in a folder of the process's own rather than
+    // the program folder: for runs beside the desktop program, such as scheduled reports.
+    bool privateWorkingFiles = false;
 
     static AppLocations forThisMachine();
     // Everything in one folder, as on Windows; used by tests and the demo workspace.

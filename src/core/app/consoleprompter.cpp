@@ -5,8 +5,8 @@
 
 using namespace Qt::StringLiterals;
 
-Prompter::Answer ConsolePrompter::message(const QString &text, const QString &title, Icon icon,
-                                          Buttons buttons)
+Prompter::Answer ConsolePrompter::showMessage(const QString &text, const QString &title, Icon icon,
+                                              Buttons buttons)
 {
     if (icon == Icon::Exclamation || icon == Icon::Critical)
         ++m_problems;

@@ -8,8 +8,6 @@
 class ConsolePrompter final : public Prompter
 {
 public:
-    Answer message(const QString &text, const QString &title, Icon icon,
-                   Buttons buttons = Buttons::Ok) override;
     void setBusyPointer() override {}
     void setNormalPointer() override {}
     QString chooseFile(const QString &, const QString &, const QString &) override { return {}; }
@@ -18,6 +16,10 @@ public:
     // Messages that warned of a problem (an error report, data out of range): a run that saw
     // one has no complete figures to give.
     int problemCount() const { return m_problems; }
+
+protected:
+    Answer showMessage(const QString &text, const QString &title, Icon icon,
+                       Buttons buttons) override;
 
 private:
     int m_problems = 0;

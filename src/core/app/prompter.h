@@ -13,10 +13,21 @@ public:
     enum class Buttons { Ok, OkCancel, YesNo, YesNoCancel, RetryCancel };
     enum class Answer { Ok, Cancel, Yes, No, Retry };
 
+    // However much a failing server or file hands on, a message stays readable: its text
+    // keeps at most this many characters and lines, its title one short line, and the rest is
+    // cut with an ellipsis.
+    static constexpr qsizetype MaxTextLength = 400;
+    static constexpr qsizetype MaxTextLines = 12;
+    static constexpr qsizetype MaxTitleLength = 100;
+
     virtual ~Prompter() = default;
 
-    virtual Answer message(const QString &text, const QString &title, Icon icon,
-                           Buttons buttons = Buttons::Ok) = 0;
+    // Every message passes here, so no prompter can be handed an unreadable one.
+    Answer message(const QString &text, const QString &title, Icon icon,
+                   Buttons buttons = Buttons::Ok);
+
+    // The text cut to the given length and number of lines, ending in "…" when cut.
+    static QString capped(const QString &text, qsizetype maxLength, qsizetype maxLines);
 
     // Busy shows the hourglass pointer; normal restores the ordinary one, however many times
     // busy was asked for.
@@ -27,6 +38,10 @@ public:
     virtual QString chooseFile(const QString &title, const QString &startPath,
                                const QString &filter) = 0;
     virtual QString chooseFolder(const QString &title, const QString &startPath) = 0;
+
+protected:
+    virtual Answer showMessage(const QString &text, const QString &title, Icon icon,
+                               Buttons buttons) = 0;
 };
 
 // Shows the busy pointer for the lifetime of the guard.

@@ -20,8 +20,8 @@ Prompter::Answer defaultAnswer(Prompter::Buttons buttons)
 
 } // namespace
 
-Prompter::Answer RecordingPrompter::message(const QString &text, const QString &title, Icon icon,
-                                            Buttons buttons)
+Prompter::Answer RecordingPrompter::showMessage(const QString &text, const QString &title,
+                                                Icon icon, Buttons buttons)
 {
     const Answer answer = m_answers.isEmpty() ? defaultAnswer(buttons) : m_answers.dequeue();
     m_messages.append({text, title, icon, buttons, answer});

@@ -23,8 +23,6 @@ public:
         Answer answer = Answer::Ok;
     };
 
-    Answer message(const QString &text, const QString &title, Icon icon,
-                   Buttons buttons = Buttons::Ok) override;
     void setBusyPointer() override;
     void setNormalPointer() override;
     QString chooseFile(const QString &title, const QString &startPath,
@@ -44,6 +42,10 @@ public:
     bool isBusy() const { return m_busy; }
     // Every pointer change in order: true for busy, false for normal.
     const QList<bool> &pointerChanges() const { return m_pointerChanges; }
+
+protected:
+    Answer showMessage(const QString &text, const QString &title, Icon icon,
+                       Buttons buttons) override;
 
 private:
     QList<Message> m_messages;

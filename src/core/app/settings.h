@@ -17,6 +17,7 @@ struct Settings
     QString tempHtmlFile;
     QString tempGifFile;
     QString tempBmpFile;
+    QString jobsFile; // the MoneyWorks export
     QString mainDatabaseFile;
 
     QString accPackage; // "MYOB" or "MoneyWorks"

@@ -19,7 +19,13 @@ void deriveProgramPaths(Settings &settings, const AppLocations &locations)
     settings.appFolder = FileOperations::addTrailingSlash(locations.appFolder);
     settings.newDatabaseFile = locations.newDatabaseFile();
     settings.cacheFile = settings.appFolder + u"data.db"_s;
-    settings.tempFolder = settings.appFolder + u"temp"_s + QDir::separator();
+}
+
+// The files only this run may touch, in the folder the working folder gives it.
+void deriveWorkingPaths(Settings &settings, const QString &workingFolder)
+{
+    settings.jobsFile = workingFolder + u"jobs.inf"_s;
+    settings.tempFolder = workingFolder + u"temp"_s + QDir::separator();
     settings.tempHtmlFile = settings.tempFolder + u"tmp.html"_s;
     settings.tempGifFile = settings.tempFolder + u"tmp.gif"_s;
     settings.tempBmpFile = settings.tempFolder + u"tmp.bmp"_s;
@@ -46,6 +52,10 @@ QString loadSettings(AppContext &context)
     deriveProgramPaths(settings, context.locations());
     // The per-user folder stands in for the program folder and may not exist on first start.
     QDir().mkpath(settings.appFolder);
+    const QString workingFolder = context.workingFolder().folderFor(settings.appFolder);
+    if (workingFolder.isEmpty())
+        return NoWorkingFolder;
+    deriveWorkingPaths(settings, workingFolder);
     FileOperations::folderExists(settings.tempFolder, true);
 
     // A location the settings cannot hold must not quietly become the program folder, where

@@ -15,3 +15,8 @@ inline const QString DatabasePathTooLong = QStringLiteral(
     "The database path in your settings is longer than 1000 characters, so it was not used and "
     "no database was opened or created. Set the database path again in the System "
     "Configuration.");
+
+inline const QString NoWorkingFolder =
+    QStringLiteral("Veltrix found no folder for the working files of this run (the report page, "
+                   "the graph's picture and the MoneyWorks export). Make room on the disk or "
+                   "check the rights on the temporary folder.");

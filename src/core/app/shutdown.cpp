@@ -27,6 +27,8 @@ void shutDown(AppContext &context)
 
     if (!context.settings().tempFolder.isEmpty())
         FileOperations::clearFolder(context.settings().tempFolder);
+    // The program ends without running destructors: a private folder goes now, with the lock.
+    context.workingFolder().release();
 }
 
 void endProgramNow(AppContext &context)

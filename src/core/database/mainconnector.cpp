@@ -3,6 +3,7 @@
 
 #include "configvalues.h"
 #include "maindatabase.h"
+#include "schemacheck.h"
 
 #include "app/appcontext.h"
 #include "app/errorreporter.h"
@@ -24,9 +25,19 @@ std::optional<DbError> openStandingRecordsets(AppContext &context)
         return error;
     PeriodDataSet::Slot &cached = context.periodDataSet().slot(0);
     cached = PeriodDataSet::Slot();
-    if (const auto problem = CacheFile::read(context.settings().cacheFile, cached)) {
+    const QString &cacheFile = context.settings().cacheFile;
+    if (const auto problem = CacheFile::read(cacheFile, cached)) {
         cached = PeriodDataSet::Slot();
-        return DbError{1, *problem};
+        QString description = problem->description;
+        // Said once: a damaged cache would otherwise stop every start until someone deleted it
+        // by hand. It only holds figures a produce makes again.
+        if (problem->damaged) {
+            if (const auto kept = CacheFile::setAside(cacheFile, context.clock().now())) {
+                description += u" It has been kept as '%1'; the next start begins without the "
+                               u"figures of the last run."_s.arg(*kept);
+            }
+        }
+        return DbError{1, description};
     }
     return database.openTabRecordsets();
 }
@@ -52,6 +63,11 @@ QString connectMainDatabase(AppContext &context)
     std::optional<DbError> error = database.connection().open(context.settings().mainDatabaseFile);
     if (!error && !database.isConnected())
         return u"Failed to connect to the main database!"_s;
+    if (!error) {
+        if (const QStringList missing = SchemaCheck::missingColumns(database.database());
+            !missing.isEmpty())
+            return SchemaCheck::refusal(missing);
+    }
     if (!error) {
         if (const auto failure = openStandingRecordsets(context))
             error = DbError{1, failure->description};

@@ -138,7 +138,9 @@ DbError SqliteConnection::errorFrom(const QSqlError &error)
     const int code = error.nativeErrorCode().toInt(&numeric);
     const QString description =
         error.databaseText().isEmpty() ? error.text() : error.databaseText();
-    if (!numeric)
+    // A failure must never carry the number 0, which the error report takes for no error: an
+    // ODBC driver manager answers some failures with a native code of 0.
+    if (!numeric || code == 0)
         return {DbError::CommunicationFailure, description};
     return errorFromCode(code, description);
 }

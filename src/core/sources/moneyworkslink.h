@@ -18,6 +18,11 @@ public:
         std::optional<DbError> error;
     };
 
+    // An answer longer than any the command gives: reading stops there.
+    static constexpr qint32 AnswerTooLargeError = 7;
+    // An answer that is not what the command answers, such as an export without its columns.
+    static constexpr qint32 UnexpectedAnswerError = 13;
+
     virtual ~MoneyWorksLink() = default;
 
     // "DocumentPath" answers the open document's path, empty when none is open.

@@ -72,8 +72,18 @@ double MoneyWorksSource::accountMovement(const QString &accountCode, const QDate
             .reportError(answer.error->number, answer.error->description, u"GetMWValue"_s);
         return 0.0;
     }
-    // MoneyWorks answers a bad expression with an error text: that is a 0, not a failure.
-    return m_numbers.parseNumber(answer.text.trimmed()).value_or(0.0);
+    const QString text = answer.text.trimmed();
+    if (const std::optional<double> value = m_numbers.parseNumber(text))
+        return *value;
+    // MoneyWorks answers an expression it cannot evaluate with its error text: that is a 0,
+    // not a failure. Any other answer is not what an evaluation gives, so it is no figure.
+    if (!text.startsWith(u"[ERROR]"_s)) {
+        ErrorReporter(m_prompter)
+            .reportError(MoneyWorksLink::UnexpectedAnswerError,
+                         u"MoneyWorks answered something that is not a number: "_s + text.left(80),
+                         u"GetMWValue"_s);
+    }
+    return 0.0;
 }
 
 qint16 MoneyWorksSource::jobsCount(const QDate &from, const QDate &to)

@@ -36,7 +36,7 @@ public:
     QString movementExpression(const QString &accountCode, const QDate &from,
                                const QDate &to) const;
     QString jobsSearch(const QDate &from, const QDate &to) const;
-    QString jobsFile() const { return m_settings.appFolder + QStringLiteral("jobs.inf"); }
+    QString jobsFile() const { return m_settings.jobsFile; }
 
     // The distinct references of an export's invoice lines, leaving out "EI" lines.
     static int countJobReferences(const QString &exportText);

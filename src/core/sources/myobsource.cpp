@@ -2,6 +2,7 @@
 #include "myobsource.h"
 
 #include "companyfile.h"
+#include "odbcdrivers.h"
 
 #include "app/errorreporter.h"
 #include "database/sqliteconnection.h"
@@ -43,6 +44,29 @@ std::optional<DbError> runQuery(QSqlQuery &query, const QString &sql)
     if (!query.exec(sql))
         return SqliteConnection::errorFrom(query.lastError());
     return std::nullopt;
+}
+
+// The driver manager would only say that a data source was not found, and Qt passes that on
+// without an error number, so nothing would be shown: the missing driver is named instead.
+std::optional<DbError> missingDriver(const QString &driver)
+{
+    const auto where = u" The driver is set in the System Configuration (Database Options, "
+                       u"Driver; the AccFileDriver setting)."_s;
+    if (!QSqlDatabase::isDriverAvailable(u"QODBC"_s)) {
+        return DbError{MyobSource::DriverMissingError,
+                       u"This computer cannot use ODBC drivers: the Qt ODBC plugin (QODBC) is "
+                       u"not installed."_s +
+                           where};
+    }
+    const std::optional<QStringList> installed = OdbcDrivers::installed();
+    if (!installed || installed->contains(driver, Qt::CaseInsensitive))
+        return std::nullopt;
+    const QString known = installed->isEmpty() ? u"none"_s : installed->join(u", "_s);
+    return DbError{
+        MyobSource::DriverMissingError,
+        u"The ODBC driver \"%1\" is not installed on this computer (installed: %2)."_s.arg(driver,
+                                                                                           known) +
+            where};
 }
 
 } // namespace
@@ -103,6 +127,8 @@ std::optional<DbError> MyobSource::openDataFile()
         }
         return std::nullopt;
     }
+    if (const auto missing = missingDriver(m_settings.accFileDriver))
+        return missing;
     m_odbcName = nextOdbcName();
     QSqlDatabase odbc = QSqlDatabase::addDatabase(u"QODBC"_s, m_odbcName);
     odbc.setDatabaseName(connectionText(m_settings));

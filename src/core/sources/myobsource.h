@@ -20,6 +20,9 @@ public:
     MyobSource(const Settings &settings, Prompter &prompter);
     ~MyobSource() override;
 
+    // The configured ODBC driver is not installed here.
+    static constexpr qint32 DriverMissingError = 3706;
+
     // "Driver={...}; TYPE=MYOB; UID=...; PWD=...; DATABASE=...;"
     static QString connectionText(const Settings &settings);
     static bool usesBuiltInEngine(const Settings &settings);

@@ -31,7 +31,7 @@ MoneyWorksLink::Answer RestMoneyWorksLink::evaluate(const QString &expression)
     // Without an open document nothing is open: that is the answer, not an error.
     if (m_document.isEmpty() && expression == u"DocumentPath"_s)
         return {};
-    return get(u"evaluate"_s, u"expr="_s + encoded(expression));
+    return get(u"evaluate"_s, u"expr="_s + encoded(expression), MaxEvaluateBytes);
 }
 
 std::optional<DbError> RestMoneyWorksLink::openDocument(const QString &document)
@@ -49,7 +49,8 @@ std::optional<DbError> RestMoneyWorksLink::openDocument(const QString &document)
                                 QUrl::RemoveUserInfo);
     m_document = name;
     // The REST interface keeps no state: what "open" can do is make sure the document answers.
-    const Answer answer = get(u"evaluate"_s, u"expr="_s + encoded(u"DocumentPath"_s));
+    const Answer answer =
+        get(u"evaluate"_s, u"expr="_s + encoded(u"DocumentPath"_s), MaxEvaluateBytes);
     if (answer.error) {
         m_document.clear();
         return answer.error;
@@ -64,16 +65,28 @@ std::optional<DbError> RestMoneyWorksLink::exportRecords(const QString &sortFiel
     // The server fills the template in once per record and adds nothing: no line of column
     // names, each line ended as the template ends it. The jobs file is read as a header line
     // and records, lines ended by CR LF, so it is written in that form.
-    const Answer answer = get(u"export"_s, u"table=transaction&search="_s + encoded(search) +
-                                               u"&sort="_s + encoded(sortField) + u"&format="_s +
-                                               encoded(u"[TheirRef]\t[Detail.Account]\n"_s));
+    const Answer answer =
+        get(u"export"_s,
+            u"table=transaction&search="_s + encoded(search) + u"&sort="_s + encoded(sortField) +
+                u"&format="_s + encoded(u"[TheirRef]\t[Detail.Account]\n"_s),
+            MaxExportBytes);
     if (answer.error)
         return answer.error;
     QStringList lines{u"theirref\tu.detail.account"_s};
     for (const QString &line : answer.text.split(u'\n', Qt::SkipEmptyParts)) {
         const QString record = line.endsWith(u'\r') ? line.chopped(1) : line;
-        if (!record.isEmpty())
-            lines << record;
+        if (record.isEmpty())
+            continue;
+        // Each record is the two asked fields and the TAB between them; anything else is not
+        // the export that was asked for, and counting it would invent jobs.
+        if (record.count(u'\t') != 1) {
+            return DbError{
+                UnexpectedAnswerError,
+                u"The MoneyWorks server's export is not the records asked for (a "
+                u"reference and an account on each line); line %1 reads: %2"_s.arg(lines.size())
+                    .arg(record.left(80))};
+        }
+        lines << record;
     }
     QSaveFile file(outputFile);
     const QByteArray bytes = (lines.join(u"\r\n"_s) + u"\r\n"_s).toUtf8();
@@ -82,7 +95,8 @@ std::optional<DbError> RestMoneyWorksLink::exportRecords(const QString &sortFiel
     return std::nullopt;
 }
 
-MoneyWorksLink::Answer RestMoneyWorksLink::get(const QString &command, const QString &parameters)
+MoneyWorksLink::Answer RestMoneyWorksLink::get(const QString &command, const QString &parameters,
+                                               qint64 maxBytes)
 {
     if (m_document.isEmpty())
         return {{}, DbError{NotADocumentError, u"No MoneyWorks document is open."_s}};
@@ -103,6 +117,18 @@ MoneyWorksLink::Answer RestMoneyWorksLink::get(const QString &command, const QSt
     QTimer timer;
     timer.setSingleShot(true);
     bool timedOut = false;
+    // The answer is taken as it arrives, and no further than the limit: a server that sends
+    // without end must not fill the memory or the disk.
+    QByteArray received;
+    bool tooLarge = false;
+    const auto take = [&] {
+        received += reply->read(maxBytes + 1 - received.size());
+        if (received.size() > maxBytes && !tooLarge) {
+            tooLarge = true;
+            reply->abort();
+        }
+    };
+    QObject::connect(reply.get(), &QNetworkReply::readyRead, &loop, take);
     QObject::connect(reply.get(), &QNetworkReply::finished, &loop, &QEventLoop::quit);
     QObject::connect(&timer, &QTimer::timeout, &loop, [&] {
         timedOut = true;
@@ -119,13 +145,26 @@ MoneyWorksLink::Answer RestMoneyWorksLink::get(const QString &command, const QSt
                                       u"seconds."_s.arg(m_server.toDisplayString())
                                           .arg(m_timeoutSeconds)}};
     }
+    if (!tooLarge)
+        take();
+    if (tooLarge) {
+        return {{},
+                DbError{AnswerTooLargeError,
+                        u"The MoneyWorks server at %1 sent more than %2 bytes for one answer; "
+                        u"it is not an answer Veltrix asked for."_s.arg(m_server.toDisplayString())
+                            .arg(maxBytes)}};
+    }
     const int status = reply->attribute(QNetworkRequest::HttpStatusCodeAttribute).toInt();
-    const QString body = QString::fromUtf8(reply->readAll());
+    const QString body = QString::fromUtf8(received);
     if (status == 401)
         return {{}, DbError{401, u"The MoneyWorks server refused the user name or password."_s}};
-    if (reply->error() != QNetworkReply::NoError || status >= 400) {
+    // The server's own words explain a refusal; when the transfer itself failed (a lost
+    // connection, content that would not unpack) the body is no explanation.
+    if (status >= 400) {
         const QString reason = body.trimmed().isEmpty() ? reply->errorString() : body.trimmed();
-        return {{}, DbError{status ? status : int(reply->error()), reason}};
+        return {{}, DbError{status, reason}};
     }
+    if (reply->error() != QNetworkReply::NoError)
+        return {{}, DbError{int(reply->error()), reply->errorString()}};
     return {body, std::nullopt};
 }

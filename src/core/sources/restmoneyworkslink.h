@@ -27,8 +27,13 @@ public:
     static constexpr qint32 TimeoutError = -2147023436;
     static constexpr qint32 NotADocumentError = 53;
 
+    // The most read for one answer: an expression's value is a line of text; an export is one
+    // short line per invoice line, and a shop's year of them stays far below this.
+    static constexpr qint64 MaxEvaluateBytes = 64 * 1024;
+    static constexpr qint64 MaxExportBytes = 32 * 1024 * 1024;
+
 private:
-    Answer get(const QString &command, const QString &parameters);
+    Answer get(const QString &command, const QString &parameters, qint64 maxBytes);
 
     QString m_user;
     QString m_password;

@@ -64,8 +64,8 @@ QtPrompter::~QtPrompter()
     setNormalPointer();
 }
 
-Prompter::Answer QtPrompter::message(const QString &text, const QString &title, Icon icon,
-                                     Buttons buttons)
+Prompter::Answer QtPrompter::showMessage(const QString &text, const QString &title, Icon icon,
+                                         Buttons buttons)
 {
     // Nobody can answer a question under an hourglass.
     const int busyDepth = m_busyDepth;

@@ -16,13 +16,15 @@ public:
     // Dialogs open over this window when it is set.
     void setParentWindow(QWidget *window) { m_parent = window; }
 
-    Answer message(const QString &text, const QString &title, Icon icon,
-                   Buttons buttons = Buttons::Ok) override;
     void setBusyPointer() override;
     void setNormalPointer() override;
     QString chooseFile(const QString &title, const QString &startPath,
                        const QString &filter) override;
     QString chooseFolder(const QString &title, const QString &startPath) override;
+
+protected:
+    Answer showMessage(const QString &text, const QString &title, Icon icon,
+                       Buttons buttons) override;
 
 private:
     QPointer<QWidget> m_parent;

@@ -38,6 +38,19 @@ void TestErrorReporter::reports_data()
     QTest::newRow("negative number keeps its sign")
         << -2147217900 << u"Syntax error."_s << u"Produce"_s
         << u"Error -2147217900\r\n\r\nSyntax error."_s << u"Produce Error -2147217900"_s;
+    // A server or file may hand on anything as a description; the box stays readable.
+    QTest::newRow("a megabyte of description is cut")
+        << 13 << QString(1 << 20, u'x') << u"GetMWValue"_s
+        << u"Error 13\r\n\r\n"_s + QString(400 - 12, u'x') + u"…"_s << u"GetMWValue Error 13"_s;
+    QTest::newRow("a thousand lines are cut to twelve")
+        << 13 << u"line\n"_s.repeated(1000) << u"GetMWJobs"_s
+        << u"Error 13\r\n\r\n"_s + u"line\n"_s.repeated(9) + u"line…"_s << u"GetMWJobs Error 13"_s;
+    QTest::newRow("a long context cuts the title")
+        << 5 << u"x"_s << QString(300, u'c') << u"Error 5\r\n\r\nx"_s
+        << QString(100, u'c') + u"…"_s;
+    QTest::newRow("no half character at the cut")
+        << 5 << QString(388, u'x') + u"😀😀"_s << u"Produce"_s
+        << u"Error 5\r\n\r\n"_s + QString(388, u'x') + u"…"_s << u"Produce Error 5"_s;
 }
 
 void TestErrorReporter::reports()

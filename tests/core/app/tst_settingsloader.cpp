@@ -140,8 +140,30 @@ void TestSettingsLoader::derivesProgramPaths()
     QCOMPARE(settings.tempHtmlFile, settings.tempFolder + u"tmp.html"_s);
     QCOMPARE(settings.tempGifFile, settings.tempFolder + u"tmp.gif"_s);
     QCOMPARE(settings.tempBmpFile, settings.tempFolder + u"tmp.bmp"_s);
+    QCOMPARE(settings.jobsFile, appFolder() + u"jobs.inf"_s);
     // The program folder is made on first start, and the temporary folder in it.
     QVERIFY(QFileInfo(settings.tempFolder).isDir());
+
+    // A second copy on the same folder while this one runs (a lock is held per process, so a
+    // second holder here stands for a second process), and any command-line run, keep their
+    // working files apart from it and from each other, until the first lets go.
+    auto second = makeContext();
+    AppLocations commandLine = AppLocations::inFolder(appFolder());
+    commandLine.privateWorkingFiles = true;
+    AppContext headless(std::make_unique<SettingsStore>(m_root->filePath(u"settings.ini"_s)),
+                        m_prompter, commandLine);
+    QStringList jobsFiles{settings.jobsFile};
+    for (AppContext *other : {second.get(), &headless}) {
+        loadSettings(*other);
+        QVERIFY(!jobsFiles.contains(other->settings().jobsFile));
+        QVERIFY(!other->settings().tempFolder.startsWith(appFolder()));
+        QVERIFY(QFileInfo(other->settings().tempFolder).isDir());
+        jobsFiles << other->settings().jobsFile;
+    }
+    m_context->workingFolder().release();
+    auto next = makeContext();
+    loadSettings(*next);
+    QCOMPARE(next->settings().jobsFile, settings.jobsFile);
 }
 
 void TestSettingsLoader::databasePathIsTrimmed()

@@ -5,8 +5,10 @@
 #include "app/settingsloader.h"
 #include "database/configvalues.h"
 #include "database/mainconnector.h"
+#include "database/schemacheck.h"
 
 #include <QProcess>
+#include <QRandomGenerator>
 #include <QSqlQuery>
 #include <QTest>
 
@@ -171,6 +173,9 @@ void TestMainConnector::cacheFile_data()
         << QStringList();
     QTest::newRow("only blanks") << QByteArray("  \r\n\r\n") << QString() << QStringList()
                                  << QStringList();
+    QByteArray noise(2048, 0);
+    QRandomGenerator(3).fillRange(reinterpret_cast<quint32 *>(noise.data()), 2048 / 4);
+    QTest::newRow("random bytes") << noise << ConnectionFailed << QStringList() << QStringList();
 }
 
 void TestMainConnector::cacheFile()
@@ -185,41 +190,72 @@ void TestMainConnector::cacheFile()
     const PeriodDataSet::Slot &slot = context().periodDataSet().slot(0);
     QCOMPARE(slot.fieldIds, ids);
     QCOMPARE(slot.fieldValues, values);
-    if (expected == ConnectionFailed) {
-        const RecordingPrompter::Message &report = m_workspace->prompter().messages().last();
-        QCOMPARE(report.title, u"Connection Error 1"_s);
-        QVERIFY(report.text.contains(u"fewer than four fields"_s));
-    }
+    if (expected != ConnectionFailed)
+        return;
+    const RecordingPrompter::Message &report = m_workspace->prompter().messages().last();
+    QCOMPARE(report.title, u"Connection Error 1"_s);
+    QVERIFY(report.text.contains(u"fewer than four fields"_s));
+
+    // Said once: the damaged file is kept beside under another name, and the next try starts
+    // with an empty slot 0.
+    const QStringList kept =
+        QDir(m_workspace->appFolder()).entryList({u"data.db.damaged-*"_s}, QDir::Files);
+    QCOMPARE(kept.size(), 1);
+    QVERIFY(report.text.contains(kept.first()));
+    QFile keptFile(m_workspace->appFolder() + kept.first());
+    QVERIFY(keptFile.open(QIODevice::ReadOnly) && keptFile.readAll() == content);
+    QCOMPARE(connectMainDatabase(context()), QString());
+    QVERIFY(context().periodDataSet().slot(0).isEmpty());
 }
 
 void TestMainConnector::unusableDatabase_data()
 {
     QTest::addColumn<QByteArray>("content");
-    QTest::addColumn<QString>("dropTable");
+    QTest::addColumn<QString>("sql");
+    QTest::addColumn<QString>("expected");
     QTest::newRow("not a database")
-        << QByteArray("This is a spreadsheet, not a database.") << QString();
-    QTest::newRow("empty file") << QByteArray("") << QString();
-    QTest::newRow("without Fields") << QByteArray() << u"Fields"_s;
-    QTest::newRow("without Config") << QByteArray() << u"Config"_s;
+        << QByteArray("This is a spreadsheet, not a database.") << QString() << ConnectionFailed;
+    QTest::newRow("empty file") << QByteArray("") << QString() << ConnectionFailed;
+    QTest::newRow("without Fields") << QByteArray() << u"DROP TABLE Fields"_s << ConnectionFailed;
+    QTest::newRow("without Config") << QByteArray() << u"DROP TABLE Config"_s << ConnectionFailed;
+    // Another tool renamed a column: every figure, rate or login would read as empty.
+    QTest::newRow("Fields.Data renamed")
+        << QByteArray() << u"ALTER TABLE Fields RENAME COLUMN Data TO Account"_s
+        << SchemaCheck::refusal({u"Fields.Data"_s});
+    QTest::newRow("Hours.Value and Users.Fields renamed")
+        << QByteArray()
+        << u"ALTER TABLE Hours RENAME COLUMN Value TO Rate;"
+           u"ALTER TABLE Users RENAME COLUMN Fields TO Lines"_s
+        << SchemaCheck::refusal({u"Users.Fields"_s, u"Hours.Value"_s});
+    QTest::newRow("Fields.tooltip dropped")
+        << QByteArray() << u"ALTER TABLE Fields DROP COLUMN tooltip"_s
+        << SchemaCheck::refusal({u"Fields.tooltip"_s});
+    QTest::newRow("a column in another case is the same column")
+        << QByteArray() << u"ALTER TABLE Hours RENAME COLUMN Value TO VALUE"_s << QString();
 }
 
 void TestMainConnector::unusableDatabase()
 {
     QFETCH(QByteArray, content);
-    QFETCH(QString, dropTable);
+    QFETCH(QString, sql);
+    QFETCH(QString, expected);
     QCOMPARE(loadSettings(context()), QString());
-    if (!dropTable.isEmpty()) {
+    if (!sql.isEmpty()) {
         SqliteConnection connection;
         QCOMPARE(connection.open(m_workspace->mainDatabase()), std::nullopt);
-        QVERIFY(QSqlQuery(connection.database()).exec(u"DROP TABLE "_s + dropTable));
+        for (const QString &statement : sql.split(u';'))
+            QVERIFY(QSqlQuery(connection.database()).exec(statement));
     } else {
         writeFile(m_workspace->mainDatabase(), content);
     }
     m_workspace->prompter().clearMessages();
 
-    QCOMPARE(connectMainDatabase(context()), ConnectionFailed);
-    QCOMPARE(m_workspace->prompter().messages().size(), 1);
-    QVERIFY(m_workspace->prompter().messages().first().title.startsWith(u"Connection Error "_s));
+    QCOMPARE(connectMainDatabase(context()), expected);
+    // A damaged file is reported as the connection's error; a refused one says why itself.
+    const QList<RecordingPrompter::Message> &messages = m_workspace->prompter().messages();
+    QCOMPARE(messages.size(), expected == ConnectionFailed ? 1 : 0);
+    if (!messages.isEmpty())
+        QVERIFY(messages.first().title.startsWith(u"Connection Error "_s));
 }
 
 void TestMainConnector::lockedDatabaseFails()

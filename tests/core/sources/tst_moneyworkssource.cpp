@@ -9,6 +9,8 @@
 #include "sources/moneyworkssource.h"
 #include "sources/restmoneyworkslink.h"
 
+#include <QNetworkReply>
+#include <QRandomGenerator>
 #include <QSqlQuery>
 #include <QTcpServer>
 #include <QTcpSocket>
@@ -41,6 +43,27 @@ public:
     }
 };
 
+// Gives the document's name to the check that opens it and the same reply to everything
+// else, as a broken or hostile server might.
+void answerNonsense(QTcpServer &server, const QByteArray &headers, const QByteArray &body)
+{
+    QObject::connect(&server, &QTcpServer::newConnection, &server, [&server, headers, body] {
+        QTcpSocket *socket = server.nextPendingConnection();
+        QObject::connect(socket, &QTcpSocket::disconnected, socket, &QObject::deleteLater);
+        QObject::connect(socket, &QTcpSocket::readyRead, socket, [socket, headers, body] {
+            const QByteArray request = socket->peek(socket->bytesAvailable());
+            const bool opening = request.contains("/evaluate/expr=DocumentPath ");
+            const QByteArray content = opening ? QUrl::toPercentEncoding(Document) : body;
+            if (request.contains("\r\n\r\n")) {
+                socket->write(
+                    "HTTP/1.1 200 OK\r\nContent-Length: " + QByteArray::number(content.size()) +
+                    "\r\n" + (opening ? QByteArray() : headers) + "\r\n" + content);
+                socket->disconnectFromHost();
+            }
+        });
+    });
+}
+
 } // namespace
 
 class TestMoneyWorksSource : public QObject
@@ -62,6 +85,8 @@ private Q_SLOTS:
     void periodEnd();
     void wrongCredentials();
     void serverThatDoesNotAnswer();
+    void serverThatAnswersNonsense_data();
+    void serverThatAnswersNonsense();
     void addressThatIsNoDocument();
 
 private:
@@ -93,6 +118,7 @@ void TestMoneyWorksSource::initTestCase()
     QCOMPARE(writer.finish(), std::nullopt);
 
     m_settings.appFolder = m_dir.path() + u'/';
+    m_settings.jobsFile = m_settings.appFolder + u"jobs.inf"_s;
     QVERIFY2(m_simulator.start({u"--ledger"_s, m_ledger, u"--document"_s, Document, u"--user"_s,
                                 u"Admin"_s, u"--password"_s, u"s3cret"_s, u"--period-end"_s,
                                 u"2025-07-31"_s}),
@@ -132,7 +158,6 @@ void TestMoneyWorksSource::textsSentToMoneyWorks()
              u"GetMovement(`accountcode = \\\"4\"11\\\"`, '1/7/25 ', '1/7/25')"_s);
     QCOMPARE(source->jobsSearch(QDate(2025, 7, 1), QDate(2025, 7, 31)),
              u"type = `DI@` and transdate >= '1/7/25' and transdate <= '31/7/25'"_s);
-    QCOMPARE(source->jobsFile(), m_settings.appFolder + u"jobs.inf"_s);
 }
 
 void TestMoneyWorksSource::countJobReferences_data()
@@ -167,17 +192,21 @@ void TestMoneyWorksSource::answersThatAreNotNumbers_data()
 {
     QTest::addColumn<QString>("answer");
     QTest::addColumn<double>("value");
-    QTest::newRow("number") << u"-1234.56"_s << -1234.56;
-    QTest::newRow("no movement") << u"0"_s << 0.0;
-    QTest::newRow("grouped") << u"1,234.50"_s << 1234.5;
-    QTest::newRow("error text") << u"[ERROR] Unknown identifier"_s << 0.0;
-    QTest::newRow("empty") << QString() << 0.0;
+    QTest::addColumn<bool>("reported");
+    QTest::newRow("number") << u"-1234.56"_s << -1234.56 << false;
+    QTest::newRow("no movement") << u"0"_s << 0.0 << false;
+    QTest::newRow("grouped") << u"1,234.50"_s << 1234.5 << false;
+    // MoneyWorks' own answer to an expression it cannot evaluate.
+    QTest::newRow("error text") << u"[ERROR] Unknown identifier"_s << 0.0 << false;
+    QTest::newRow("empty") << QString() << 0.0 << true;
+    QTest::newRow("number and more") << u"12 apples"_s << 0.0 << true;
 }
 
 void TestMoneyWorksSource::answersThatAreNotNumbers()
 {
     QFETCH(QString, answer);
     QFETCH(double, value);
+    QFETCH(bool, reported);
     ScriptedLink *link = nullptr;
     auto source = sourceFor(link);
     const QDate day(2025, 7, 1);
@@ -185,7 +214,7 @@ void TestMoneyWorksSource::answersThatAreNotNumbers()
     source->isReachable(); // makes the link
     link->answers.insert(source->movementExpression(u"4-1100"_s, day, day), {answer, std::nullopt});
     QCOMPARE(source->accountMovement(u"4-1100"_s, day, day), value);
-    QVERIFY(m_prompter.messages().isEmpty());
+    QCOMPARE(m_prompter.messages().size(), reported ? 1 : 0);
 }
 
 void TestMoneyWorksSource::movementsThroughTheServer()
@@ -342,6 +371,56 @@ void TestMoneyWorksSource::serverThatDoesNotAnswer()
     QCOMPARE(m_prompter.messages().size(), 2);
     for (const RecordingPrompter::Message &message : m_prompter.messages())
         QCOMPARE(message.title, u"GetMWValue Error -2147023436"_s);
+}
+
+void TestMoneyWorksSource::serverThatAnswersNonsense_data()
+{
+    QTest::addColumn<QByteArray>("headers");
+    QTest::addColumn<QByteArray>("body");
+    QTest::addColumn<QStringList>("titles");
+    QByteArray noise(4096, 0);
+    QRandomGenerator(17).fillRange(reinterpret_cast<quint32 *>(noise.data()), 4096 / 4);
+    const QStringList notAnswers{u"GetMWValue Error 13"_s, u"GetMWJobs Error 13"_s};
+    const QStringList tooLarge{u"GetMWValue Error 7"_s, u"GetMWJobs Error 7"_s};
+    QTest::newRow("random bytes") << QByteArray() << noise << notAnswers;
+    QTest::newRow("a web page") << QByteArray("Content-Type: text/html\r\n")
+                                << QByteArray("<html><body>It works!</body></html>") << notAnswers;
+    QTest::newRow("references without accounts")
+        << QByteArray() << QByteArray("RO1\nRO2\nRO3\n") << notAnswers;
+    QTest::newRow("three columns") << QByteArray() << QByteArray("RO1\t4-1100\tx\n") << notAnswers;
+    QTest::newRow("40 MB of records")
+        << QByteArray() << QByteArray("RO1\t4-1100\n").repeated(4 << 20) << tooLarge;
+    // 100 MB of one letter, squeezed to about 100 KB: the network layer refuses to unpack it.
+    const QString unpacked = QString::number(QNetworkReply::UnknownContentError);
+    QTest::newRow("compressed bomb")
+        << QByteArray("Content-Encoding: deflate\r\n")
+        << qCompress(QByteArray(100 << 20, 'A'), 9).mid(4)
+        << QStringList{u"GetMWValue Error "_s + unpacked, u"GetMWJobs Error "_s + unpacked};
+}
+
+void TestMoneyWorksSource::serverThatAnswersNonsense()
+{
+    QFETCH(QByteArray, headers);
+    QFETCH(QByteArray, body);
+    QFETCH(QStringList, titles);
+    QTcpServer server;
+    answerNonsense(server, headers, body);
+    QVERIFY(server.listen(QHostAddress::LocalHost));
+    auto source = serverSource(QString(), QString(), server.serverPort());
+    QCOMPARE(source->openDataFile(), std::nullopt);
+    QFile::remove(source->jobsFile());
+    m_prompter.clearMessages();
+
+    // No figure comes of it, and each call says what went wrong in a box of readable size.
+    QCOMPARE(source->accountMovement(u"4-1100"_s, QDate(2025, 7, 1), QDate(2025, 7, 31)), 0.0);
+    QCOMPARE(source->jobsCount(QDate(2025, 7, 1), QDate(2025, 7, 31)), qint16(0));
+    QStringList shown;
+    for (const RecordingPrompter::Message &message : m_prompter.messages()) {
+        shown << message.title;
+        QVERIFY(message.text.size() <= Prompter::MaxTextLength + 1);
+    }
+    QCOMPARE(shown, titles);
+    QVERIFY(!QFile::exists(source->jobsFile()));
 }
 
 void TestMoneyWorksSource::addressThatIsNoDocument()

@@ -1,4 +1,5 @@
 // Veltrix — KPI dashboard for small businesses.
+#include "app/errorreporter.h"
 #include "app/recordingprompter.h"
 #include "sources/companyfilewriter.h"
 #include "sources/myobsource.h"
@@ -216,8 +217,13 @@ void TestMyobSource::unknownOdbcDriverFailsToOpen()
     MyobSource source(settings, prompter);
     const std::optional<DbError> error = source.openDataFile();
     QVERIFY(error);
-    QVERIFY(!error->description.isEmpty());
     QVERIFY(!source.isReachable());
+    // The report names the driver and where it is set; a number of 0 would show nothing.
+    ErrorReporter(prompter).reportError(error->number, error->description, u"Produce"_s);
+    QCOMPARE(prompter.messages().size(), 1);
+    QCOMPARE(prompter.messages().first().title, u"Produce Error 3706"_s);
+    QVERIFY(prompter.messages().first().text.contains(u"\"NoSuchDriver\" is not installed"_s));
+    QVERIFY(prompter.messages().first().text.contains(u"AccFileDriver"_s));
 }
 
 QTEST_GUILESS_MAIN(TestMyobSource)
