@@ -46,6 +46,17 @@ QString randomSingleByteText(QRandomGenerator &random)
     return Windows1252::toUnicode(bytes);
 }
 
+// Stored values come from a settings store anyone can edit. Whatever is in there, decrypting
+// it must end: either with the password or with an error and the value handed back as it was.
+void decryptSafely(PasswordCipher &cipher, const QString &stored)
+{
+    const QString result = cipher.decryptText(stored, Key);
+    if (cipher.cryptoError() != PasswordCipher::NoError)
+        QCOMPARE(result, stored);
+    else
+        QVERIFY(cipher.cryptoErrorMessage().isEmpty());
+}
+
 } // namespace
 
 class TestPasswordCipher : public QObject
@@ -68,6 +79,8 @@ private Q_SLOTS:
     void codePageMapsSpecialCharacters_data();
     void codePageMapsSpecialCharacters();
     void armourBreaksLongLines();
+    void randomText();
+    void mutatedStoredValues();
 };
 
 void TestPasswordCipher::roundTripsThousandsOfTexts()
@@ -304,6 +317,59 @@ void TestPasswordCipher::armourBreaksLongLines()
     QCOMPARE(Base64Armour::encode(QByteArrayLiteral("ab"), 9999), u"YWI="_s);
     QCOMPARE(Base64Armour::decode(u"YWI="_s), QByteArrayLiteral("ab"));
     QCOMPARE(Base64Armour::decode(u"YW="_s), QByteArray());
+}
+
+void TestPasswordCipher::randomText()
+{
+    static const QString Base64Characters =
+        u"ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/= \r\n"_s;
+    QRandomGenerator random(1);
+    PasswordCipher cipher(&random);
+    for (int i = 0; i < 5000; ++i) {
+        QString stored;
+        const int length = int(random.bounded(400));
+        for (int k = 0; k < length; ++k)
+            stored.append(Base64Characters.at(random.bounded(Base64Characters.size())));
+        decryptSafely(cipher, stored);
+        if (QTest::currentTestFailed())
+            return;
+    }
+}
+
+void TestPasswordCipher::mutatedStoredValues()
+{
+    QRandomGenerator random(2);
+    PasswordCipher cipher(&random);
+    int decodedAnyway = 0;
+    for (int i = 0; i < 5000; ++i) {
+        QString password;
+        const int length = 1 + int(random.bounded(40));
+        for (int k = 0; k < length; ++k)
+            password.append(QChar(char16_t(0x20 + random.bounded(0x5F))));
+        QString stored = cipher.encryptText(password, Key);
+
+        // Damage it: flip characters, cut it, or graft on a piece of another value.
+        switch (random.bounded(3)) {
+        case 0:
+            for (int flips = 1 + int(random.bounded(3)); flips > 0; --flips)
+                stored[random.bounded(stored.size())] =
+                    QChar(char16_t(0x2B + random.bounded(0x50)));
+            break;
+        case 1:
+            stored.truncate(random.bounded(stored.size()));
+            break;
+        default:
+            stored.insert(random.bounded(stored.size()), cipher.encryptText(u"x"_s, Key).left(8));
+            break;
+        }
+        decryptSafely(cipher, stored);
+        if (QTest::currentTestFailed())
+            return;
+        if (cipher.cryptoError() == PasswordCipher::NoError)
+            ++decodedAnyway;
+    }
+    // Damage to the header only still decodes; everything else must be caught.
+    QVERIFY2(decodedAnyway < 2500, qPrintable(QString::number(decodedAnyway)));
 }
 
 QTEST_GUILESS_MAIN(TestPasswordCipher)
