@@ -3,7 +3,9 @@
 
 #include "app/appcontext.h"
 #include "app/recordingprompter.h"
+#include "app/settingsloader.h"
 #include "app/settingsstore.h"
+#include "database/mainconnector.h"
 #include "database/sqliteconnection.h"
 
 #include <QDir>
@@ -56,17 +58,44 @@ public:
                 return false;
             QFile::setPermissions(mainDatabase(), QFileDevice::ReadOwner | QFileDevice::WriteOwner);
         }
+        return exec(QStringLiteral("UPDATE Config SET Value = ? WHERE ID = ?"), {value, id});
+    }
+
+    // Starts up as the program does (settings, then main.db); the note about a new database
+    // file is cleared, as it is not what a test is about.
+    bool connect()
+    {
+        const bool connected =
+            loadSettings(context()).isEmpty() && connectMainDatabase(context()).isEmpty();
+        m_prompter.clearMessages();
+        return connected;
+    }
+
+    // SQL run on main.db over a connection of its own, as another copy of the program would.
+    bool exec(const QString &sql, const QVariantList &values = {})
+    {
         SqliteConnection connection;
-        if (connection.open(mainDatabase()))
-            return false;
-        QSqlQuery query(connection.database());
-        query.prepare(QStringLiteral("UPDATE Config SET Value = ? WHERE ID = ?"));
-        query.addBindValue(value);
-        query.addBindValue(id);
+        QSqlQuery query = prepared(connection, sql, values);
         return query.exec();
+    }
+    QVariant value(const QString &sql, const QVariantList &values = {})
+    {
+        SqliteConnection connection;
+        QSqlQuery query = prepared(connection, sql, values);
+        return query.exec() && query.next() ? query.value(0) : QVariant();
     }
 
 private:
+    QSqlQuery prepared(SqliteConnection &connection, const QString &sql, const QVariantList &values)
+    {
+        connection.open(mainDatabase());
+        QSqlQuery query(connection.database());
+        query.prepare(sql);
+        for (const QVariant &value : values)
+            query.addBindValue(value);
+        return query;
+    }
+
     QTemporaryDir m_root;
     RecordingPrompter m_prompter;
     std::unique_ptr<AppContext> m_context;

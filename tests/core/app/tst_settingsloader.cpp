@@ -38,13 +38,11 @@ private Q_SLOTS:
     void checksInOrder_data();
     void checksInOrder();
     void derivesProgramPaths();
-    void databasePathIsTrimmed();
     void createsMainDatabaseFromTemplateOnce();
     void templateFoundInLaterCandidate();
     void unwritableDatabaseFolderShowsNoMessage();
     void deciphersThePassword_data();
     void deciphersThePassword();
-    void recordsYearAndScrollBarHeight();
 
 private:
     std::unique_ptr<AppContext>
@@ -166,16 +164,6 @@ void TestSettingsLoader::derivesProgramPaths()
     QCOMPARE(next->settings().jobsFile, settings.jobsFile);
 }
 
-void TestSettingsLoader::databasePathIsTrimmed()
-{
-    touch(dataFolder() + u"/main.db"_s);
-    store().writeSetting(u"DBPath"_s, u"  "_s + dataFolder() + u"  "_s);
-    store().writeSetting(u"AccPackage"_s, u"MoneyWorks"_s);
-    QCOMPARE(loadSettings(*m_context), QString());
-    QCOMPARE(m_context->settings().mainDatabaseFile,
-             dataFolder() + QDir::separator() + u"main.db"_s);
-}
-
 void TestSettingsLoader::createsMainDatabaseFromTemplateOnce()
 {
     QVERIFY(QDir().mkpath(appFolder()));
@@ -244,7 +232,9 @@ void TestSettingsLoader::deciphersThePassword()
     QFETCH(QString, stored);
     QFETCH(QString, expected);
     touch(dataFolder() + u"/main.db"_s);
-    store().writeSetting(u"DBPath"_s, dataFolder());
+    m_context = makeContext(Clock::fixedAt(QDateTime(QDate(2031, 1, 1), QTime(0, 0))));
+    m_context->setPlatformScrollBarHeight(21);
+    store().writeSetting(u"DBPath"_s, u"  "_s + dataFolder() + u"  "_s); // trimmed
     store().writeSetting(u"AccPackage"_s, u"MoneyWorks"_s);
     store().writeSetting(u"AccFilePath"_s, u"/books/Acme.moneyworks"_s);
     store().writeSetting(u"AccFileUser"_s, u"Admin"_s);
@@ -255,19 +245,9 @@ void TestSettingsLoader::deciphersThePassword()
     QCOMPARE(settings.accFilePass, expected);
     QCOMPARE(settings.accFilePath, u"/books/Acme.moneyworks"_s);
     QCOMPARE(settings.accFileUser, u"Admin"_s);
-}
-
-void TestSettingsLoader::recordsYearAndScrollBarHeight()
-{
-    touch(dataFolder() + u"/main.db"_s);
-    m_context = makeContext(Clock::fixedAt(QDateTime(QDate(2031, 1, 1), QTime(0, 0))));
-    m_context->setPlatformScrollBarHeight(21);
-    store().writeSetting(u"DBPath"_s, dataFolder());
-    store().writeSetting(u"AccPackage"_s, u"MoneyWorks"_s);
-
-    QCOMPARE(loadSettings(*m_context), QString());
-    QCOMPARE(m_context->settings().currentYear, 2031);
-    QCOMPARE(m_context->settings().scrollBarHeight, qint16(21));
+    QCOMPARE(settings.mainDatabaseFile, dataFolder() + QDir::separator() + u"main.db"_s);
+    QCOMPARE(settings.currentYear, 2031);
+    QCOMPARE(settings.scrollBarHeight, qint16(21));
 }
 
 QTEST_GUILESS_MAIN(TestSettingsLoader)

@@ -15,12 +15,11 @@ private Q_SLOTS:
     void init();
     void twipsPerPixel_data();
     void twipsPerPixel();
+    void savesNormalWindowInTwips_data();
     void savesNormalWindowInTwips();
-    void maximisedKeepsLastNormalGeometry();
-    void minimisedRecordsNothing();
+    void maximisedAndMinimised();
     void restoreAppliesOnlyWholeNumbers_data();
     void restoreAppliesOnlyWholeNumbers();
-    void roundTripAtHighDensity();
 
 private:
     std::unique_ptr<QTemporaryDir> m_dir;
@@ -50,35 +49,44 @@ void TestWindowPlacement::twipsPerPixel()
     QCOMPARE(WindowPlacement::twipsPerPixelAt(dpi), twips);
 }
 
-void TestWindowPlacement::savesNormalWindowInTwips()
+void TestWindowPlacement::savesNormalWindowInTwips_data()
 {
-    WindowPlacement placement(*m_store, 15.0);
-    placement.save(u"frmCompare"_s, QRect(100, 50, 640, 480), WindowPlacement::State::Normal);
-    const QString forms = SettingsStore::FormsKey;
-    QCOMPARE(m_store->readSetting(u"frmCompareLeft"_s, forms), u"1500"_s);
-    QCOMPARE(m_store->readSetting(u"frmCompareTop"_s, forms), u"750"_s);
-    QCOMPARE(m_store->readSetting(u"frmCompareWidth"_s, forms), u"9600"_s);
-    QCOMPARE(m_store->readSetting(u"frmCompareHeight"_s, forms), u"7200"_s);
-    QCOMPARE(m_store->readSetting(u"frmCompareState"_s, forms), u"0"_s);
-    QCOMPARE(placement.restore(u"frmCompare"_s, QRect()), QRect(100, 50, 640, 480));
+    QTest::addColumn<double>("twips"); // per pixel
+    QTest::addColumn<QRect>("geometry");
+    QTest::addColumn<QStringList>("stored"); // left, top, width, height
+    QTest::newRow("96 dpi") << 15.0 << QRect(100, 50, 640, 480)
+                            << QStringList{u"1500"_s, u"750"_s, u"9600"_s, u"7200"_s};
+    QTest::newRow("144 dpi") << 10.0 << QRect(33, 44, 555, 666)
+                             << QStringList{u"330"_s, u"440"_s, u"5550"_s, u"6660"_s};
 }
 
-void TestWindowPlacement::maximisedKeepsLastNormalGeometry()
+void TestWindowPlacement::savesNormalWindowInTwips()
+{
+    QFETCH(double, twips);
+    QFETCH(QRect, geometry);
+    QFETCH(QStringList, stored);
+    WindowPlacement(*m_store, twips)
+        .save(u"frmCompare"_s, geometry, WindowPlacement::State::Normal);
+    QStringList written;
+    for (const QString &key : {u"Left"_s, u"Top"_s, u"Width"_s, u"Height"_s})
+        written << m_store->readSetting(u"frmCompare"_s + key, SettingsStore::FormsKey);
+    QCOMPARE(written, stored);
+    QCOMPARE(m_store->readSetting(u"frmCompareState"_s, SettingsStore::FormsKey), u"0"_s);
+    QCOMPARE(WindowPlacement(*m_store, twips).restore(u"frmCompare"_s, QRect()), geometry);
+}
+
+void TestWindowPlacement::maximisedAndMinimised()
 {
     WindowPlacement placement(*m_store, 15.0);
+    // Minimised records nothing.
+    placement.save(u"frmPrint"_s, QRect(10, 20, 300, 200), WindowPlacement::State::Minimised);
+    QCOMPARE(m_store->readSetting(u"frmPrintTop"_s, SettingsStore::FormsKey), QString());
+    QCOMPARE(placement.savedState(u"frmPrint"_s), std::nullopt);
+    // Maximised keeps the last normal geometry.
     placement.save(u"frmPrint"_s, QRect(10, 20, 300, 200), WindowPlacement::State::Normal);
     placement.save(u"frmPrint"_s, QRect(0, 0, 1920, 1080), WindowPlacement::State::Maximised);
     QCOMPARE(placement.restore(u"frmPrint"_s, QRect()), QRect(10, 20, 300, 200));
     QCOMPARE(placement.savedState(u"frmPrint"_s), WindowPlacement::State::Maximised);
-}
-
-void TestWindowPlacement::minimisedRecordsNothing()
-{
-    WindowPlacement placement(*m_store, 15.0);
-    placement.save(u"frmPrint"_s, QRect(10, 20, 300, 200), WindowPlacement::State::Minimised);
-    QCOMPARE(m_store->readSetting(u"frmPrintTop"_s, SettingsStore::FormsKey), QString());
-    QCOMPARE(m_store->readSetting(u"frmPrintState"_s, SettingsStore::FormsKey), QString());
-    QCOMPARE(placement.savedState(u"frmPrint"_s), std::nullopt);
 }
 
 void TestWindowPlacement::restoreAppliesOnlyWholeNumbers_data()
@@ -103,15 +111,6 @@ void TestWindowPlacement::restoreAppliesOnlyWholeNumbers()
     m_store->writeSetting(u"frmCompareWidth"_s, width, SettingsStore::FormsKey);
     QCOMPARE(WindowPlacement(*m_store, 15.0).restore(u"frmCompare"_s, QRect(5, 6, 70, 80)),
              expected);
-}
-
-void TestWindowPlacement::roundTripAtHighDensity()
-{
-    WindowPlacement(*m_store, 10.0)
-        .save(u"frmCompare"_s, QRect(33, 44, 555, 666), WindowPlacement::State::Normal);
-    QCOMPARE(m_store->readSetting(u"frmCompareWidth"_s, SettingsStore::FormsKey), u"5550"_s);
-    QCOMPARE(WindowPlacement(*m_store, 10.0).restore(u"frmCompare"_s, QRect()),
-             QRect(33, 44, 555, 666));
 }
 
 QTEST_GUILESS_MAIN(TestWindowPlacement)

@@ -1,8 +1,6 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
-#include "app/settingsloader.h"
-#include "database/mainconnector.h"
 #include "database/recordoperations.h"
 
 #include <QSqlQuery>
@@ -49,9 +47,7 @@ void TestRecordOperations::init()
 {
     m_workspace = std::make_unique<TestWorkspace>();
     QVERIFY(m_workspace->configure());
-    QCOMPARE(loadSettings(m_workspace->context()), QString());
-    QCOMPARE(connectMainDatabase(m_workspace->context()), QString());
-    m_workspace->prompter().clearMessages();
+    QVERIFY(m_workspace->connect());
 }
 
 void TestRecordOperations::cleanup()

@@ -17,14 +17,12 @@ private Q_SLOTS:
     void init();
     void cleanup();
     void walksAndReadsByAnyCase();
-    void emptyRecordSetIsBeforeAndPastEnd();
     void findsIdForwardFromCurrent();
     void addsUpdatesAndDeletes();
     void updateOfAChangedRowFails();
     void updateOfADeletedRowFails();
     void changesToOtherColumnsDoNotConflict();
     void readOnlyAndJoinedQueriesRefuseChanges();
-    void bindingsKeepQuotesAsText();
     void openFailures_data();
     void openFailures();
 
@@ -69,16 +67,11 @@ void TestRecordSet::walksAndReadsByAnyCase()
     QVERIFY(!hours.value(u"Department"_s).isValid());
     QCOMPARE(hours.moveNext()->number, DbError::NoCurrentRecord);
     QVERIFY(!hours.value(u"NoSuchColumn"_s).isValid());
-}
 
-void TestRecordSet::emptyRecordSetIsBeforeAndPastEnd()
-{
     RecordSet users(m_first->database(), u"SELECT * FROM Users"_s);
     QCOMPARE(users.open(), std::nullopt);
-    QVERIFY(users.bof());
-    QVERIFY(users.eof());
+    QVERIFY(users.bof() && users.eof()); // empty: before the start and past the end at once
     QCOMPARE(users.moveFirst()->number, DbError::NoCurrentRecord);
-
     RecordSet closed;
     QVERIFY(!closed.isOpen());
     QCOMPARE(closed.moveFirst()->number, DbError::RecordsetClosed);
@@ -192,10 +185,8 @@ void TestRecordSet::readOnlyAndJoinedQueriesRefuseChanges()
                      u"SELECT h.ID, h.Value, c.Value AS c FROM Hours h, Config c"_s);
     QCOMPARE(joined.open(), std::nullopt);
     QVERIFY(joined.setValue(u"Value"_s, 1).has_value());
-}
 
-void TestRecordSet::bindingsKeepQuotesAsText()
-{
+    // Bound values keep their quotes as text.
     QSqlQuery(m_first->database())
         .exec(u"INSERT INTO Users (UserName, Password) VALUES ('O''Brien', 'x')"_s);
     RecordSet users(m_first->database(), u"SELECT * FROM Users WHERE UserName = ?"_s,

@@ -1,8 +1,6 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
-#include "app/settingsloader.h"
-#include "database/mainconnector.h"
 #include "engine/producecommand.h"
 #include "engine/rangeloader.h"
 #include "setup/hourlyrates.h"
@@ -28,8 +26,7 @@ public:
     {
         m_ready = m_workspace.configure(u"MYOB"_s);
         m_workspace.store().writeSetting(u"DBPath"_s, sharedFolder);
-        m_ready = m_ready && loadSettings(m_workspace.context()).isEmpty() &&
-                  connectMainDatabase(m_workspace.context()).isEmpty();
+        m_ready = m_ready && m_workspace.connect();
         m_rates.load();
         m_setup.load();
         m_rates.commitEdit(GridOperations::findGridRow(m_rates.grid(), 1, u"1"_s), u"50"_s);
@@ -83,12 +80,6 @@ private Q_SLOTS:
     void anotherCopysSetupReachesTheNextProduceWhole();
 
 private:
-    bool start()
-    {
-        return loadSettings(m_workspace->context()).isEmpty() &&
-               connectMainDatabase(m_workspace->context()).isEmpty();
-    }
-
     std::unique_ptr<TestWorkspace> m_workspace;
 };
 
@@ -133,7 +124,7 @@ void TestProduceCommand::rangeEnds()
 
 void TestProduceCommand::firstProduceOpensTheCompanyFile()
 {
-    QVERIFY(start());
+    QVERIFY(m_workspace->connect());
     AppContext &context = m_workspace->context();
     QVERIFY(!context.accountingSource());
     QCOMPARE(ProduceCommand(context).produce({2, 2008, 2, 2008}), Outcome::Produced);
@@ -163,7 +154,7 @@ void TestProduceCommand::invalidRangeIsRefused()
 {
     QFETCH(Selection, selection);
     QFETCH(bool, valid);
-    QVERIFY(start());
+    QVERIFY(m_workspace->connect());
     AppContext &context = m_workspace->context();
     context.periodDataSet().storeFieldValue(79, 5.0, 0); // the previous produce
     m_workspace->prompter().clearMessages();
@@ -186,7 +177,7 @@ void TestProduceCommand::invalidRangeIsRefused()
 void TestProduceCommand::noSourceAndNoFile()
 {
     m_workspace->store().writeSetting(u"AccFilePath"_s, QString());
-    QVERIFY(start());
+    QVERIFY(m_workspace->connect());
     QCOMPARE(ProduceCommand(m_workspace->context()).produce({1, 2008, 1, 2008}), Outcome::NoSource);
     const RecordingPrompter::Message &message = m_workspace->prompter().messages().last();
     QCOMPARE(message.title, u"Cannot Produce KPI's"_s);
@@ -199,7 +190,7 @@ void TestProduceCommand::noSourceAndNoFile()
 void TestProduceCommand::unreadableCompanyFileIsReported()
 {
     QFile::remove(m_workspace->path(u"ledger.myo"_s));
-    QVERIFY(start());
+    QVERIFY(m_workspace->connect());
     m_workspace->prompter().clearMessages();
     QCOMPARE(ProduceCommand(m_workspace->context()).produce({1, 2008, 1, 2008}), Outcome::Failed);
     QCOMPARE(m_workspace->prompter().messages().size(), 1);
@@ -211,7 +202,7 @@ void TestProduceCommand::moneyWorksWithoutDocumentOrFile()
 {
     m_workspace->store().writeSetting(u"AccPackage"_s, u"MoneyWorks"_s);
     m_workspace->store().writeSetting(u"AccFilePath"_s, QString());
-    QVERIFY(start());
+    QVERIFY(m_workspace->connect());
     QCOMPARE(ProduceCommand(m_workspace->context()).produce({1, 2008, 1, 2008}), Outcome::NoSource);
     QVERIFY(m_workspace->prompter().messages().last().text.startsWith(
         u"There is no running instance of MoneyWorks and your primary Account data file has not "
@@ -220,7 +211,7 @@ void TestProduceCommand::moneyWorksWithoutDocumentOrFile()
 
 void TestProduceCommand::anotherCopysSetupReachesTheNextProduceWhole()
 {
-    QVERIFY(start());
+    QVERIFY(m_workspace->connect());
     AppContext &context = m_workspace->context();
     const auto produced = [&](int field) {
         return ProduceCommand(context).produce({2, 2008, 2, 2008}) == Outcome::Produced

@@ -1,8 +1,6 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
-#include "app/settingsloader.h"
-#include "database/mainconnector.h"
 #include "users/loginservice.h"
 
 #include <QSqlQuery>
@@ -28,8 +26,7 @@ private:
 void TestLoginService::initTestCase()
 {
     QVERIFY(m_workspace.configure());
-    QCOMPARE(loadSettings(m_workspace.context()), QString());
-    QCOMPARE(connectMainDatabase(m_workspace.context()), QString());
+    QVERIFY(m_workspace.connect());
     QSqlQuery query(m_workspace.context().mainDatabase().database());
     for (const auto &[name, password, type, fields] :
          {std::tuple{u"bob"_s, u"Secret1"_s, 0, u"1,2#13"_s},

@@ -1,9 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
-#include "app/settingsloader.h"
 #include "database/configvalues.h"
-#include "database/mainconnector.h"
 #include "users/loginsession.h"
 
 #include <QSqlQuery>
@@ -29,12 +27,6 @@ private:
         return ConfigValues(workspace.context().mainDatabase(), workspace.prompter())
             .getConfigValue(ConfigValues::UserCount);
     }
-    static bool start(TestWorkspace &workspace)
-    {
-        return loadSettings(workspace.context()).isEmpty() &&
-               connectMainDatabase(workspace.context()).isEmpty();
-    }
-
     std::unique_ptr<TestWorkspace> m_workspace;
 };
 
@@ -42,7 +34,7 @@ void TestLoginSession::init()
 {
     m_workspace = std::make_unique<TestWorkspace>();
     QVERIFY(m_workspace->configure());
-    QVERIFY(start(*m_workspace));
+    QVERIFY(m_workspace->connect());
     QVERIFY(QSqlQuery(m_workspace->context().mainDatabase().database())
                 .exec(u"INSERT INTO Users (UserName, Password, Type, Fields) "
                       u"VALUES ('bob', 'pw', 0, '1,2')"_s));
@@ -94,7 +86,7 @@ void TestLoginSession::twoCopiesCountToTwoAndBack()
     TestWorkspace other;
     other.store().writeSetting(u"DBPath"_s, m_workspace->sharedFolder());
     other.store().writeSetting(u"AccPackage"_s, u"MoneyWorks"_s);
-    QVERIFY(start(other));
+    QVERIFY(other.connect());
     LoginSession first(m_workspace->context());
     LoginSession second(other.context());
     QCOMPARE(first.login(u"bob"_s, u"pw"_s), u"1"_s);

@@ -1,9 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
-#include "app/settingsloader.h"
 #include "database/configvalues.h"
-#include "database/mainconnector.h"
 #include "users/usercounter.h"
 #include "users/userpoll.h"
 
@@ -40,8 +38,7 @@ void TestUserCounter::init()
 {
     m_workspace = std::make_unique<TestWorkspace>();
     QVERIFY(m_workspace->configure());
-    QCOMPARE(loadSettings(m_workspace->context()), QString());
-    QCOMPARE(connectMainDatabase(m_workspace->context()), QString());
+    QVERIFY(m_workspace->connect());
 }
 
 void TestUserCounter::cleanup()

@@ -1,8 +1,6 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
-#include "app/settingsloader.h"
-#include "database/mainconnector.h"
 #include "engine/usualsign.h"
 #include "views/gridoperations.h"
 #include "views/kpigrid.h"
@@ -51,8 +49,7 @@ void TestTabViewBuilder::init()
 {
     m_workspace = std::make_unique<TestWorkspace>();
     QVERIFY(m_workspace->configure());
-    QCOMPARE(loadSettings(context()), QString());
-    QCOMPARE(connectMainDatabase(context()), QString());
+    QVERIFY(m_workspace->connect());
     context().setNumberFormat(NumberFormat(QLocale(QLocale::English, QLocale::Australia)));
     context().loginState() = LoginState{true, u"sysop"_s, 1, QString()};
     PeriodDataSet &data = context().periodDataSet();

@@ -21,16 +21,13 @@ class TestLoadingWindow : public QObject
     Q_OBJECT
 
 private Q_SLOTS:
-    void startsWaiting();
-    void failedStateOffersOptions();
+    void startsWaitingThenOffersOptions();
     void updateStateOffersUpdate();
-    void successHandsOver();
-    void savedOptionsRunStartUpAgain();
-    void cancelledOptionsChangeNothing();
-    void aboutShowsBothVersions();
+    void optionsCancelledOrSaved();
+    void successHandsOverAndAboutShowsBothVersions();
 };
 
-void TestLoadingWindow::startsWaiting()
+void TestLoadingWindow::startsWaitingThenOffersOptions()
 {
     TestWorkspace workspace;
     LoadingWindow window(workspace.context(), workspace.prompter());
@@ -44,17 +41,11 @@ void TestLoadingWindow::startsWaiting()
     QVERIFY(window.butClose()->isHidden());
     QCOMPARE(window.tmrLoad()->interval(), 500);
     QVERIFY(!window.tmrLoad()->isActive());
-    window.startLoading();
-    QVERIFY(window.tmrLoad()->isActive());
-}
-
-void TestLoadingWindow::failedStateOffersOptions()
-{
-    TestWorkspace workspace;
-    LoadingWindow window(workspace.context(), workspace.prompter());
     window.show();
     QVERIFY(QTest::qWaitForWindowExposed(&window));
     window.startLoading();
+    QVERIFY(window.tmrLoad()->isActive());
+    // With nothing configured start-up fails and offers the options.
     QTRY_VERIFY(!window.lblStatus()->isHidden());
     QCOMPARE(window.lblStatus()->text(), u"Your accounting package must be specified!"_s);
     QVERIFY(window.lblStatus()->styleSheet().contains(u"rgb(255, 0, 0)"_s));
@@ -84,20 +75,7 @@ void TestLoadingWindow::updateStateOffersUpdate()
     QVERIFY(!workspace.context().mainDatabase().isConnected());
 }
 
-void TestLoadingWindow::successHandsOver()
-{
-    TestWorkspace workspace;
-    QVERIFY(workspace.configure());
-    LoadingWindow window(workspace.context(), workspace.prompter());
-    QSignalSpy handedOver(&window, &LoadingWindow::startupSucceeded);
-    window.show();
-    window.runSequence();
-    QCOMPARE(handedOver.count(), 1);
-    QVERIFY(!window.isVisible());
-    QVERIFY(workspace.context().mainDatabase().isConnected());
-}
-
-void TestLoadingWindow::savedOptionsRunStartUpAgain()
+void TestLoadingWindow::optionsCancelledOrSaved()
 {
     TestWorkspace workspace;
     QVERIFY(QFile::copy(QStringLiteral(VELTRIX_NEW_DB), workspace.appFolder() + u"new.db"_s));
@@ -106,6 +84,17 @@ void TestLoadingWindow::savedOptionsRunStartUpAgain()
     window.show();
     window.runSequence();
     QVERIFY(!window.butOptions()->isHidden());
+    const QString message = window.lblStatus()->text();
+    // Cancelled options change nothing.
+    QTimer::singleShot(0, this, [] {
+        auto *dialog = qobject_cast<ConfigDialog *>(QApplication::activeModalWidget());
+        QVERIFY(dialog);
+        dialog->reject();
+    });
+    window.butOptions()->click();
+    QCOMPARE(window.lblStatus()->text(), message);
+    QVERIFY(!window.butOptions()->isHidden());
+    QVERIFY(!window.tmrLoad()->isActive());
 
     QTimer::singleShot(0, this, [&] {
         auto *dialog = qobject_cast<ConfigDialog *>(QApplication::activeModalWidget());
@@ -122,31 +111,17 @@ void TestLoadingWindow::savedOptionsRunStartUpAgain()
     QTRY_COMPARE(handedOver.count(), 1);
 }
 
-void TestLoadingWindow::cancelledOptionsChangeNothing()
-{
-    TestWorkspace workspace;
-    LoadingWindow window(workspace.context(), workspace.prompter());
-    window.show();
-    window.runSequence();
-    const QString message = window.lblStatus()->text();
-
-    QTimer::singleShot(0, this, [] {
-        auto *dialog = qobject_cast<ConfigDialog *>(QApplication::activeModalWidget());
-        QVERIFY(dialog);
-        dialog->reject();
-    });
-    window.butOptions()->click();
-    QCOMPARE(window.lblStatus()->text(), message);
-    QVERIFY(!window.butOptions()->isHidden());
-    QVERIFY(!window.tmrLoad()->isActive());
-}
-
-void TestLoadingWindow::aboutShowsBothVersions()
+void TestLoadingWindow::successHandsOverAndAboutShowsBothVersions()
 {
     TestWorkspace workspace;
     QVERIFY(workspace.configure());
     LoadingWindow starter(workspace.context(), workspace.prompter());
+    QSignalSpy handedOver(&starter, &LoadingWindow::startupSucceeded);
+    starter.show();
     starter.runSequence();
+    QCOMPARE(handedOver.count(), 1);
+    QVERIFY(!starter.isVisible());
+    QVERIFY(workspace.context().mainDatabase().isConnected());
 
     QString databaseLabel;
     QString closeCaption;

@@ -46,7 +46,6 @@ private Q_SLOTS:
     void cleanup();
     void loginInAnyCaseGreetsTheStoredName();
     void builtInAccountWithNoUsers();
-    void failedLogin();
     void stepButtons_data();
     void stepButtons();
     void yearIsCheckedBeforeUse_data();
@@ -54,9 +53,7 @@ private Q_SLOTS:
     void resetCounterLogsEveryWindowOff();
     void clockFormat();
     void typeAheadCompletesNames();
-    void twoWindowsCountToTwoAndBack();
     void shutdownRequestEndsTheProgramUnderADialog();
-    void logoffRequestIsWithdrawnWhileItsBoxIsOpen();
     void produceShowsTheDemoFigures();
     void nextUserSeesNothingOfTheLast();
     void setupMenuFollowsTheUser_data();
@@ -66,9 +63,7 @@ private Q_SLOTS:
 private:
     static bool connectWorkspace(TestWorkspace &workspace)
     {
-        return workspace.context().mainDatabase().isConnected() ||
-               (loadSettings(workspace.context()).isEmpty() &&
-                connectMainDatabase(workspace.context()).isEmpty());
+        return workspace.context().mainDatabase().isConnected() || workspace.connect();
     }
     std::unique_ptr<MainWindow> openWindow(TestWorkspace &workspace)
     {
@@ -115,6 +110,16 @@ void TestMainWindow::loginInAnyCaseGreetsTheStoredName()
     auto window = openWindow(*m_workspace);
     QVERIFY(window);
     addUser(*m_workspace, u"bob"_s);
+    addUser(*m_workspace, u"ann_1"_s);
+    addUser(*m_workspace, u"annA1"_s);
+    m_workspace->prompter().clearMessages();
+    window->login(u"ann_1"_s, u"wrong"_s); // "_" is a character: only ann_1's password counts
+    QCOMPARE(m_workspace->prompter().messages().size(), 1);
+    QCOMPARE(m_workspace->prompter().messages().first().title, u"Login Failed"_s);
+    QCOMPARE(m_workspace->prompter().messages().first().text,
+             u"Login failed! Ensure your username and password are correct!"_s);
+    QVERIFY(!m_workspace->context().loginState().loggedIn);
+
     window->login(u"Bob"_s, u"pw"_s);
     QCOMPARE(window->lblLoggedIn()->text(), u"Welcome, bob"_s);
     QCOMPARE(window->lblActiveUsers()->text(), u"1 user is logged in"_s);
@@ -146,21 +151,6 @@ void TestMainWindow::builtInAccountWithNoUsers()
     QCOMPARE(window->lstCompareType()->itemText(0), u"Year"_s); // "The Past 1 Year"
     window->lstCompareCount()->setCurrentIndex(1);
     QCOMPARE(window->lstCompareType()->itemText(1), u"Periods"_s);
-}
-
-void TestMainWindow::failedLogin()
-{
-    auto window = openWindow(*m_workspace);
-    QVERIFY(window);
-    addUser(*m_workspace, u"ann_1"_s);
-    addUser(*m_workspace, u"annA1"_s);
-    m_workspace->prompter().clearMessages();
-    window->login(u"ann_1"_s, u"wrong"_s); // "_" is a character: only ann_1's password counts
-    QCOMPARE(m_workspace->prompter().messages().size(), 1);
-    QCOMPARE(m_workspace->prompter().messages().first().title, u"Login Failed"_s);
-    QCOMPARE(m_workspace->prompter().messages().first().text,
-             u"Login failed! Ensure your username and password are correct!"_s);
-    QVERIFY(!m_workspace->context().loginState().loggedIn);
 }
 
 void TestMainWindow::stepButtons_data()
@@ -257,25 +247,6 @@ void TestMainWindow::yearIsCheckedBeforeUse()
     QCOMPARE(box->hasFocus(), action != u"Tab"_s);
 }
 
-void TestMainWindow::resetCounterLogsEveryWindowOff()
-{
-    auto window = openWindow(*m_workspace);
-    QVERIFY(window);
-    addUser(*m_workspace, u"bob"_s);
-    window->login(u"bob"_s, u"pw"_s);
-    m_workspace->prompter().scriptAnswer(Prompter::Answer::Yes);
-    window->resetUserCounter();
-    m_workspace->prompter().clearMessages();
-    window->pollUsers();
-    QVERIFY(!m_workspace->context().loginState().loggedIn);
-    QTRY_COMPARE(m_workspace->prompter().messages().size(), 1);
-    QCOMPARE(m_workspace->prompter().messages().first().title, u"Network Request"_s);
-    window->pollUsers(); // the second look withdraws the request
-    const ConfigValues config(m_workspace->context().mainDatabase(), m_workspace->prompter());
-    QCOMPARE(config.getConfigValue(5), QString());
-    QCOMPARE(config.getConfigValue(4), u"0"_s);
-}
-
 void TestMainWindow::clockFormat()
 {
     QCOMPARE(MainWindow::clockText(QDateTime(QDate(2026, 12, 5), QTime(9, 5))),
@@ -307,29 +278,6 @@ void TestMainWindow::typeAheadCompletesNames()
     QCOMPARE(box->text(), u"J"_s);
 }
 
-void TestMainWindow::twoWindowsCountToTwoAndBack()
-{
-    QVERIFY(connectWorkspace(*m_workspace));
-    addUser(*m_workspace, u"bob"_s);
-    addUser(*m_workspace, u"carol"_s);
-    TestWorkspace other;
-    other.store().writeSetting(u"DBPath"_s, m_workspace->sharedFolder());
-    other.store().writeSetting(u"AccPackage"_s, u"MoneyWorks"_s);
-    auto first = openWindow(*m_workspace);
-    auto second = openWindow(other);
-    QVERIFY(first && second);
-    first->login(u"bob"_s, u"pw"_s);
-    second->login(u"carol"_s, u"pw"_s);
-    QCOMPARE(second->lblActiveUsers()->text(), u"2 users are logged in"_s);
-    first->pollUsers();
-    QCOMPARE(first->lblActiveUsers()->text(), u"2 users are logged in"_s);
-    first->logoff(true);
-    second->logoff(true);
-    QCOMPARE(ConfigValues(m_workspace->context().mainDatabase(), m_workspace->prompter())
-                 .getConfigValue(4),
-             u"0"_s);
-}
-
 void TestMainWindow::shutdownRequestEndsTheProgramUnderADialog()
 {
     auto window = openWindow(*m_workspace);
@@ -355,10 +303,12 @@ void TestMainWindow::shutdownRequestEndsTheProgramUnderADialog()
     QVERIFY(!m_workspace->context().mainDatabase().isConnected());
 }
 
-void TestMainWindow::logoffRequestIsWithdrawnWhileItsBoxIsOpen()
+void TestMainWindow::resetCounterLogsEveryWindowOff()
 {
     auto window = openWindow(*m_workspace);
     QVERIFY(window);
+    addUser(*m_workspace, u"bob"_s);
+    window->login(u"bob"_s, u"pw"_s);
     const ConfigValues config(m_workspace->context().mainDatabase(), m_workspace->prompter());
     bool withdrawnWhileOpen = false;
     m_workspace->prompter().setWhileShown([&](const RecordingPrompter::Message &message) {
@@ -369,11 +319,13 @@ void TestMainWindow::logoffRequestIsWithdrawnWhileItsBoxIsOpen()
         withdrawnWhileOpen = QTest::qWaitFor([&] { return config.getConfigValue(5).isEmpty(); },
                                              2 * UserPoll::IntervalMs + 500);
     });
-    QCOMPARE(config.setConfigValue(5, u"Logoff"_s), std::nullopt);
-    QTRY_VERIFY_WITH_TIMEOUT(!m_workspace->prompter().messages().isEmpty(),
-                             2 * UserPoll::IntervalMs);
+    m_workspace->prompter().scriptAnswer(Prompter::Answer::Yes);
+    window->resetUserCounter();
+    QCOMPARE(config.getConfigValue(5), u"Logoff"_s);
     QTRY_VERIFY_WITH_TIMEOUT(withdrawnWhileOpen, 3 * UserPoll::IntervalMs);
     m_workspace->prompter().setWhileShown({});
+    QVERIFY(!m_workspace->context().loginState().loggedIn);
+    QCOMPARE(config.getConfigValue(4), u"0"_s);
 }
 
 void TestMainWindow::produceShowsTheDemoFigures()

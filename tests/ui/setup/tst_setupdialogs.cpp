@@ -1,54 +1,17 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
-#include "app/settingsloader.h"
-#include "database/mainconnector.h"
 #include "setup/celleditor.h"
 #include "setup/hourlyratesdialog.h"
 #include "setup/programsetupdialog.h"
 #include "views/gridview.h"
 
 #include <QPushButton>
-#include <QSqlQuery>
 #include <QTest>
 
 using namespace Qt::StringLiterals;
 
 namespace {
-
-// A second copy of the program working on the same database.
-class OtherCopy
-{
-public:
-    explicit OtherCopy(const QString &file)
-        : m_name(u"other-copy-%1"_s.arg(quintptr(this)))
-    {
-        QSqlDatabase database = QSqlDatabase::addDatabase(u"QSQLITE"_s, m_name);
-        database.setDatabaseName(file);
-        database.open();
-    }
-    ~OtherCopy() { QSqlDatabase::removeDatabase(m_name); }
-
-    bool exec(const QString &sql, const QVariantList &values = {})
-    {
-        QSqlQuery query(QSqlDatabase::database(m_name));
-        query.prepare(sql);
-        for (const QVariant &value : values)
-            query.addBindValue(value);
-        return query.exec();
-    }
-    QVariant value(const QString &sql, const QVariantList &values = {})
-    {
-        QSqlQuery query(QSqlDatabase::database(m_name));
-        query.prepare(sql);
-        for (const QVariant &value : values)
-            query.addBindValue(value);
-        return query.exec() && query.next() ? query.value(0) : QVariant();
-    }
-
-private:
-    QString m_name;
-};
 
 // Clicks a cell as the user would, which asks the grid to edit its row.
 void clickCell(GridView *view, int row, int column)
@@ -57,7 +20,7 @@ void clickCell(GridView *view, int row, int column)
     QTest::mouseClick(view->viewport(), Qt::LeftButton, {}, cell.center());
 }
 
-void typeInto(CellEditor *editor, const QString &text, Qt::Key end)
+void typeInto(CellEditor *editor, const QString &text, Qt::Key end = Qt::Key_Return)
 {
     QVERIFY(editor->isOpen());
     editor->clear();
@@ -88,29 +51,16 @@ private Q_SLOTS:
     void escapeKeepsTheRate();
     void typedKeyOpensTheBoxAndArrowsMove();
     void cancelWritesNothing();
-    void rateOfADeletedDepartmentIsSkipped();
-    void anotherCopysChangeIsReportedNotLost();
     void emptySectionsAreNotListed();
     void codesAreTrimmedAndSaved();
     void headingsAreNotEdited();
-    void escapeThenOkKeepsTheValue();
     void hiddenFieldIsListedButNotSaved();
     void anotherCopyMeanwhile_data();
     void anotherCopyMeanwhile();
 
 private:
-    // Starts up on the workspace; the note about a new database file is not what is tested.
-    bool connect()
-    {
-        const bool connected = loadSettings(m_workspace->context()).isEmpty() &&
-                               connectMainDatabase(m_workspace->context()).isEmpty();
-        m_workspace->prompter().clearMessages();
-        return connected;
-    }
-    QVariant stored(const QString &sql, const QVariantList &values = {})
-    {
-        return OtherCopy(m_workspace->mainDatabase()).value(sql, values);
-    }
+    bool connect() { return m_workspace->connect(); }
+    QVariant stored(const QString &sql) { return m_workspace->value(sql); }
 
     std::unique_ptr<TestWorkspace> m_workspace;
 };
@@ -149,7 +99,7 @@ void TestSetupDialogs::rateEdits()
     QFETCH(double, saved);
     QFETCH(QString, message);
     QVERIFY(connect());
-    OtherCopy(m_workspace->mainDatabase()).exec(u"UPDATE Hours SET Value = 65 WHERE ID = 1"_s);
+    m_workspace->exec(u"UPDATE Hours SET Value = 65 WHERE ID = 1"_s);
     HourlyRatesDialog dialog(m_workspace->context());
     dialog.show();
     GridModel &grid = dialog.rates().grid();
@@ -160,7 +110,7 @@ void TestSetupDialogs::rateEdits()
     clickCell(dialog.lstRates(), 1, 2); // the department: the rate is edited all the same
     QVERIFY(dialog.txtEdit()->isOpen());
     QCOMPARE(dialog.txtEdit()->text(), u"65.00"_s);
-    typeInto(dialog.txtEdit(), typed, Qt::Key_Return);
+    typeInto(dialog.txtEdit(), typed);
     QVERIFY(!dialog.txtEdit()->isVisible());
     QCOMPARE(grid.cellText(1, 3), shown);
 
@@ -174,7 +124,7 @@ void TestSetupDialogs::escapeKeepsTheRate()
 {
     QVERIFY(connect());
     // A rate nobody edits is kept exactly, though the list shows it rounded.
-    OtherCopy(m_workspace->mainDatabase()).exec(u"UPDATE Hours SET Value = 65.125 WHERE ID = 1"_s);
+    m_workspace->exec(u"UPDATE Hours SET Value = 65.125 WHERE ID = 1"_s);
     HourlyRatesDialog dialog(m_workspace->context());
     dialog.show();
     clickCell(dialog.lstRates(), 2, 3);
@@ -217,7 +167,7 @@ void TestSetupDialogs::cancelWritesNothing()
         HourlyRatesDialog dialog(m_workspace->context());
         dialog.show();
         clickCell(dialog.lstRates(), 1, 3);
-        typeInto(dialog.txtEdit(), u"80"_s, Qt::Key_Return);
+        typeInto(dialog.txtEdit(), u"80"_s);
         dialog.butCancel()->click();
     }
     {
@@ -225,52 +175,15 @@ void TestSetupDialogs::cancelWritesNothing()
         dialog.show();
         const int row = rowOf(dialog.setup().grid(ProgramSetup::Mapping), 1, u"13"_s);
         clickCell(dialog.lstA(), row, 4);
-        typeInto(dialog.txtEdit(), u"9-9999"_s, Qt::Key_Return);
+        QCOMPARE(dialog.txtEdit()->text(), u"4-1100"_s);
+        typeInto(dialog.txtEdit(), u"4-9999"_s, Qt::Key_Escape);
+        QCOMPARE(dialog.setup().grid(ProgramSetup::Mapping).cellText(row, 4), u"4-1100"_s);
+        clickCell(dialog.lstA(), row, 4);
+        typeInto(dialog.txtEdit(), u"9-9999"_s);
         dialog.butCancel()->click();
     }
     QCOMPARE(stored(u"SELECT Value FROM Hours WHERE ID = 1"_s).toDouble(), 0.0);
     QCOMPARE(stored(u"SELECT Data FROM Fields WHERE ID = 13"_s).toString(), u"4-1100"_s);
-}
-
-void TestSetupDialogs::rateOfADeletedDepartmentIsSkipped()
-{
-    QVERIFY(connect());
-    HourlyRatesDialog dialog(m_workspace->context());
-    dialog.show();
-    clickCell(dialog.lstRates(), 1, 3);
-    typeInto(dialog.txtEdit(), u"70"_s, Qt::Key_Down);
-    QVERIFY(dialog.txtEdit()->isOpen() == false);
-    clickCell(dialog.lstRates(), 2, 3);
-    typeInto(dialog.txtEdit(), u"75"_s, Qt::Key_Return);
-    QVERIFY(OtherCopy(m_workspace->mainDatabase()).exec(u"DELETE FROM Hours WHERE ID = 2"_s));
-
-    dialog.butOK()->click();
-    QVERIFY(!dialog.isVisible());
-    QVERIFY(m_workspace->prompter().messages().isEmpty());
-    QCOMPARE(stored(u"SELECT Value FROM Hours WHERE ID = 1"_s).toDouble(), 70.0);
-    QCOMPARE(stored(u"SELECT COUNT(*) FROM Hours"_s).toInt(), 1);
-}
-
-void TestSetupDialogs::anotherCopysChangeIsReportedNotLost()
-{
-    QVERIFY(connect());
-    HourlyRatesDialog dialog(m_workspace->context());
-    dialog.show();
-    clickCell(dialog.lstRates(), 1, 3);
-    typeInto(dialog.txtEdit(), u"70"_s, Qt::Key_Return);
-    clickCell(dialog.lstRates(), 2, 3);
-    typeInto(dialog.txtEdit(), u"75"_s, Qt::Key_Return);
-    // Meanwhile someone else sets the paint rate.
-    QVERIFY(
-        OtherCopy(m_workspace->mainDatabase()).exec(u"UPDATE Hours SET Value = 88 WHERE ID = 2"_s));
-
-    dialog.butOK()->click();
-    QVERIFY(dialog.isVisible()); // the window stays open
-    QCOMPARE(m_workspace->prompter().messages().size(), 1);
-    QVERIFY(m_workspace->prompter().messages().first().title.contains(u"Save Labour Hours"_s));
-    // The row before the conflict stays saved; the other copy's rate is not overwritten.
-    QCOMPARE(stored(u"SELECT Value FROM Hours WHERE ID = 1"_s).toDouble(), 70.0);
-    QCOMPARE(stored(u"SELECT Value FROM Hours WHERE ID = 2"_s).toDouble(), 88.0);
 }
 
 void TestSetupDialogs::emptySectionsAreNotListed()
@@ -308,9 +221,9 @@ void TestSetupDialogs::codesAreTrimmedAndSaved()
     const int mapping = rowOf(dialog.setup().grid(ProgramSetup::Mapping), 1, u"88"_s);
     const int benchmark = rowOf(dialog.setup().grid(ProgramSetup::Benchmarks), 1, u"1"_s);
     clickCell(dialog.lstA(), mapping, 3);
-    typeInto(dialog.txtEdit(), u"  5-3200 + 5-3300+5-3400  "_s, Qt::Key_Return);
+    typeInto(dialog.txtEdit(), u"  5-3200 + 5-3300+5-3400  "_s);
     clickCell(dialog.lstB(), benchmark, 4);
-    typeInto(dialog.txtEdit(), u" >50,<40 "_s, Qt::Key_Return);
+    typeInto(dialog.txtEdit(), u" >50,<40 "_s);
     QCOMPARE(dialog.setup().grid(ProgramSetup::Mapping).cellText(mapping, 4),
              u"5-3200 + 5-3300+5-3400"_s);
     dialog.butOK()->click();
@@ -335,34 +248,18 @@ void TestSetupDialogs::headingsAreNotEdited()
     QCOMPARE(dialog.setup().grid(ProgramSetup::Mapping).cellText(1, 4), QString());
 }
 
-void TestSetupDialogs::escapeThenOkKeepsTheValue()
-{
-    QVERIFY(connect());
-    ProgramSetupDialog dialog(m_workspace->context());
-    dialog.show();
-    const int row = rowOf(dialog.setup().grid(ProgramSetup::Mapping), 1, u"13"_s);
-    clickCell(dialog.lstA(), row, 4);
-    QCOMPARE(dialog.txtEdit()->text(), u"4-1100"_s);
-    typeInto(dialog.txtEdit(), u"4-9999"_s, Qt::Key_Escape);
-    QCOMPARE(dialog.setup().grid(ProgramSetup::Mapping).cellText(row, 4), u"4-1100"_s);
-    dialog.butOK()->click();
-    QVERIFY(!dialog.isVisible());
-    QCOMPARE(stored(u"SELECT Data FROM Fields WHERE ID = 13"_s).toString(), u"4-1100"_s);
-}
-
 void TestSetupDialogs::hiddenFieldIsListedButNotSaved()
 {
     // Hide the Field before the program reads its Fields.
     QVERIFY(QFile::copy(QStringLiteral(VELTRIX_NEW_DB), m_workspace->mainDatabase()));
-    QVERIFY(
-        OtherCopy(m_workspace->mainDatabase()).exec(u"UPDATE Fields SET Hide = 1 WHERE ID = 14"_s));
+    QVERIFY(m_workspace->exec(u"UPDATE Fields SET Hide = 1 WHERE ID = 14"_s));
     QVERIFY(connect());
     ProgramSetupDialog dialog(m_workspace->context());
     dialog.show();
     const int row = rowOf(dialog.setup().grid(ProgramSetup::Mapping), 1, u"14"_s);
     QVERIFY(row > 0);
     clickCell(dialog.lstA(), row, 4);
-    typeInto(dialog.txtEdit(), u"5-1111"_s, Qt::Key_Return);
+    typeInto(dialog.txtEdit(), u"5-1111"_s);
     QCOMPARE(dialog.setup().grid(ProgramSetup::Mapping).cellText(row, 4), u"5-1111"_s);
     dialog.butOK()->click();
     QVERIFY(!dialog.isVisible());
@@ -371,42 +268,60 @@ void TestSetupDialogs::hiddenFieldIsListedButNotSaved()
 
 void TestSetupDialogs::anotherCopyMeanwhile_data()
 {
+    QTest::addColumn<bool>("rates"); // else the account mapping
     QTest::addColumn<QString>("otherCopy");
-    QTest::addColumn<bool>("reported");
-    QTest::addColumn<QString>("first");  // Field 13 afterwards; empty when deleted
-    QTest::addColumn<QString>("second"); // Field 14 afterwards
+    QTest::addColumn<QString>("reported"); // title of the one message; empty for none
+    QTest::addColumn<QString>("first");    // the first row edited, afterwards; empty when deleted
+    QTest::addColumn<QString>("second");
     // A row another copy deleted is passed over; one it changed stops the save, reported,
     // with the rows before it saved and the other copy's value kept.
-    QTest::newRow("deleted") << u"DELETE FROM Fields WHERE ID = 13"_s << false << QString()
-                             << u"5-1101"_s;
-    QTest::newRow("changed") << u"UPDATE Fields SET Data = '5-1199' WHERE ID = 14"_s << true
-                             << u"4-1101"_s << u"5-1199"_s;
+    QTest::newRow("rate deleted") << true << u"DELETE FROM Hours WHERE ID = 2"_s << QString()
+                                  << u"70"_s << QString();
+    QTest::newRow("rate changed") << true << u"UPDATE Hours SET Value = 88 WHERE ID = 2"_s
+                                  << u"Save Labour Hours"_s << u"70"_s << u"88"_s;
+    QTest::newRow("mapping deleted")
+        << false << u"DELETE FROM Fields WHERE ID = 13"_s << QString() << QString() << u"5-1101"_s;
+    QTest::newRow("mapping changed")
+        << false << u"UPDATE Fields SET Data = '5-1199' WHERE ID = 14"_s << u"Save Program Setup"_s
+        << u"4-1101"_s << u"5-1199"_s;
 }
 
 void TestSetupDialogs::anotherCopyMeanwhile()
 {
+    QFETCH(bool, rates);
     QFETCH(QString, otherCopy);
-    QFETCH(bool, reported);
+    QFETCH(QString, reported);
     QFETCH(QString, first);
     QFETCH(QString, second);
     QVERIFY(connect());
-    ProgramSetupDialog dialog(m_workspace->context());
+    HourlyRatesDialog ratesDialog(m_workspace->context());
+    ProgramSetupDialog setupDialog(m_workspace->context());
+    QDialog &dialog = rates ? static_cast<QDialog &>(ratesDialog) : setupDialog;
     dialog.show();
-    const GridModel &grid = dialog.setup().grid(ProgramSetup::Mapping);
-    clickCell(dialog.lstA(), rowOf(grid, 1, u"13"_s), 4);
-    typeInto(dialog.txtEdit(), u"4-1101"_s, Qt::Key_Return);
-    clickCell(dialog.lstA(), rowOf(grid, 1, u"14"_s), 4);
-    typeInto(dialog.txtEdit(), u"5-1101"_s, Qt::Key_Return);
-    QVERIFY(OtherCopy(m_workspace->mainDatabase()).exec(otherCopy));
+    if (rates) {
+        clickCell(ratesDialog.lstRates(), 1, 3);
+        typeInto(ratesDialog.txtEdit(), u"70"_s);
+        clickCell(ratesDialog.lstRates(), 2, 3);
+        typeInto(ratesDialog.txtEdit(), u"75"_s);
+    } else {
+        const GridModel &grid = setupDialog.setup().grid(ProgramSetup::Mapping);
+        clickCell(setupDialog.lstA(), rowOf(grid, 1, u"13"_s), 4);
+        typeInto(setupDialog.txtEdit(), u"4-1101"_s);
+        clickCell(setupDialog.lstA(), rowOf(grid, 1, u"14"_s), 4);
+        typeInto(setupDialog.txtEdit(), u"5-1101"_s);
+    }
+    QVERIFY(m_workspace->exec(otherCopy));
 
-    dialog.butOK()->click();
-    QCOMPARE(dialog.isVisible(), reported);
+    (rates ? ratesDialog.butOK() : setupDialog.butOK())->click();
+    QCOMPARE(dialog.isVisible(), !reported.isEmpty());
     const auto &messages = m_workspace->prompter().messages();
-    QCOMPARE(messages.size(), reported ? 1 : 0);
-    if (reported)
-        QVERIFY(messages.first().title.contains(u"Save Program Setup"_s));
-    QCOMPARE(stored(u"SELECT Data FROM Fields WHERE ID = 13"_s).toString(), first);
-    QCOMPARE(stored(u"SELECT Data FROM Fields WHERE ID = 14"_s).toString(), second);
+    QCOMPARE(messages.size(), reported.isEmpty() ? 0 : 1);
+    if (!reported.isEmpty())
+        QVERIFY(messages.first().title.contains(reported));
+    const QString sql = rates ? u"SELECT Value FROM Hours WHERE ID = %1"_s
+                              : u"SELECT Data FROM Fields WHERE ID = %1"_s;
+    QCOMPARE(stored(sql.arg(rates ? 1 : 13)).toString(), first);
+    QCOMPARE(stored(sql.arg(rates ? 2 : 14)).toString(), second);
 }
 
 QTEST_MAIN(TestSetupDialogs)

@@ -1,8 +1,6 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
-#include "app/settingsloader.h"
-#include "database/mainconnector.h"
 #include "users/loginservice.h"
 #include "users/useraccountsdialog.h"
 #include "views/gridview.h"
@@ -46,8 +44,7 @@ private Q_SLOTS:
     void noTicksIsStoredAsHash();
     void editingMayTakeAnotherAccountsName();
     void deleteWhileEditingThenSave();
-    void cancelShowsTheStoredValues();
-    void allAndNoneLeaveHeadings();
+    void allNoneAndCancel();
     void headerClicksSort();
     void closingWhileEditingAsks_data();
     void closingWhileEditingAsks();
@@ -55,12 +52,9 @@ private Q_SLOTS:
 private:
     void addUser(const QString &name, const QString &password, int type, const QString &fields)
     {
-        QSqlQuery query(m_workspace->context().mainDatabase().database());
-        query.prepare(u"INSERT INTO Users (UserName, Password, Type, DateCreated, Fields) "
-                      u"VALUES (?, ?, ?, '1 Jan 2026 9:00 AM', ?)"_s);
-        for (const QVariant &value : QVariantList{name, password, type, fields})
-            query.addBindValue(value);
-        QVERIFY(query.exec());
+        QVERIFY(m_workspace->exec(u"INSERT INTO Users (UserName, Password, Type, DateCreated, "
+                                  u"Fields) VALUES (?, ?, ?, '1 Jan 2026 9:00 AM', ?)"_s,
+                                  {name, password, type, fields}));
     }
     std::optional<StoredUser> stored(const QString &name)
     {
@@ -74,12 +68,7 @@ private:
                           query.value(2).toInt(), query.value(3).toString(),
                           query.value(4).toString()};
     }
-    int userCount()
-    {
-        QSqlQuery query(u"SELECT COUNT(*) FROM Users"_s,
-                        m_workspace->context().mainDatabase().database());
-        return query.next() ? query.value(0).toInt() : -1;
-    }
+    int userCount() { return m_workspace->value(u"SELECT COUNT(*) FROM Users"_s).toInt(); }
     int rowOfUser(UserAccountsDialog &dialog, const QString &name)
     {
         const GridModel &users = dialog.accounts().users();
@@ -132,8 +121,7 @@ void TestUserAccountsDialog::init()
 {
     m_workspace = std::make_unique<TestWorkspace>(Clock::fixedAt(Now));
     QVERIFY(m_workspace->configure());
-    QCOMPARE(loadSettings(m_workspace->context()), QString());
-    QCOMPARE(connectMainDatabase(m_workspace->context()), QString());
+    QVERIFY(m_workspace->connect());
     addUser(u"Bob"_s, u"bob1"_s, 0, u"1,2,3#13"_s);
     addUser(u"Anna"_s, u"anna1"_s, 1, u"1,999,#2"_s);
     m_workspace->prompter().clearMessages();
@@ -306,22 +294,11 @@ void TestUserAccountsDialog::deleteWhileEditingThenSave()
     QCOMPARE(m_workspace->prompter().messages().size(), before);
 }
 
-void TestUserAccountsDialog::cancelShowsTheStoredValues()
+void TestUserAccountsDialog::allNoneAndCancel()
 {
     UserAccountsDialog dialog(m_workspace->context());
     dialog.button(u"butEdit"_s)->click();
     type(dialog.txtUsername(), u"Changed"_s);
-    dialog.button(u"butAll"_s)->click();
-    dialog.button(u"butCancelChanges"_s)->click();
-    QCOMPARE(dialog.txtUsername()->text(), u"Anna"_s);
-    QCOMPARE(ticked(dialog), (QStringList{u"1"_s, u"2"_s}));
-    QCOMPARE(stored(u"Anna"_s)->fields, u"1,999,#2"_s);
-}
-
-void TestUserAccountsDialog::allAndNoneLeaveHeadings()
-{
-    UserAccountsDialog dialog(m_workspace->context());
-    dialog.button(u"butEdit"_s)->click();
     dialog.button(u"butAll"_s)->click();
     const GridModel &fields = dialog.accounts().fields();
     int headings = 0;
@@ -335,6 +312,11 @@ void TestUserAccountsDialog::allAndNoneLeaveHeadings()
     QCOMPARE(ticked(dialog).size(), fields.rowCount() - headings);
     dialog.button(u"butNone"_s)->click();
     QCOMPARE(ticked(dialog), QStringList());
+    // Cancel shows the stored values again.
+    dialog.button(u"butCancelChanges"_s)->click();
+    QCOMPARE(dialog.txtUsername()->text(), u"Anna"_s);
+    QCOMPARE(ticked(dialog), (QStringList{u"1"_s, u"2"_s}));
+    QCOMPARE(stored(u"Anna"_s)->fields, u"1,999,#2"_s);
 }
 
 void TestUserAccountsDialog::headerClicksSort()

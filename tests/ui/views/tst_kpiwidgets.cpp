@@ -31,7 +31,6 @@ private Q_SLOTS:
     void barGeometry_data();
     void barGeometry();
     void graphPlacesBarsAndLabels();
-    void barFocusNamesItsField();
     void tooltipPanelWidth_data();
     void tooltipPanelWidth();
     void gridViewFollowsTheModel();
@@ -105,19 +104,6 @@ void TestKpiWidgets::graphPlacesBarsAndLabels()
     QVERIFY(graph.variantLabels().isEmpty());
     QCOMPARE(graph.bars().at(1)->x(), graph.bars().at(0)->x() + graph.bars().at(0)->width());
     QVERIFY(qAbs(graph.bars().at(0)->width() - (graph.width() - GraphArea::ScaleMargin) / 2) <= 2);
-}
-
-void TestKpiWidgets::barFocusNamesItsField()
-{
-    GraphArea graph(m_numbers);
-    graph.resize(graph.sizeHint());
-    graph.setBars({{16, u">45"_s, 50.0}, {19, u">40"_s, 30.0}}, false);
-    graph.show();
-    QVERIFY(QTest::qWaitForWindowExposed(&graph));
-    QSignalSpy focused(&graph, &GraphArea::barFocused);
-    QTest::mouseClick(graph.bars().at(1), Qt::LeftButton);
-    QTRY_COMPARE(focused.count(), 1);
-    QCOMPARE(focused.first().first().toLongLong(), 19);
 }
 
 void TestKpiWidgets::tooltipPanelWidth_data()
