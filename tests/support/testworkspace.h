@@ -2,8 +2,8 @@
 #pragma once
 
 #include "app/appcontext.h"
-#include "app/recordingprompter.h"
-#include "app/settingsstore.h"
+#include "common/recordingprompter.h"
+#include "common/settingsstore.h"
 #include "database/sqliteconnection.h"
 
 #include <QDir>

@@ -1,9 +1,10 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
+#include "app/contextwiring.h"
+#include "app/mainconnector.h"
 #include "app/settingsloader.h"
 #include "app/shutdown.h"
-#include "database/mainconnector.h"
 #include "engine/formulatable.h"
 #include "engine/rangeloader.h"
 #include "sources/companyfilewriter.h"
@@ -89,7 +90,7 @@ private:
     {
         context().mainDatabase().requeryFields();
         context().periodDataSet().setCurrentSlot(0);
-        RangeLoader(context()).loadDateRange(from, to);
+        ContextWiring::rangeLoader(context()).loadDateRange(from, to);
     }
     QString storedValue(int id) const
     {
@@ -361,7 +362,7 @@ void TestRangeLoader::periodLimit()
 
 void TestRangeLoader::hourlyRates()
 {
-    RangeLoader loader(context());
+    RangeLoader loader = ContextWiring::rangeLoader(context());
     QCOMPARE(loader.hourlyRate(1), 98.0);
     QCOMPARE(loader.hourlyRate(2), 104.0);
     QCOMPARE(loader.hourlyRate(3), 0.0);

@@ -1,5 +1,5 @@
 // Veltrix — KPI dashboard for small businesses.
-#include "app/recordingprompter.h"
+#include "common/recordingprompter.h"
 #include "sources/companyfilewriter.h"
 #include "sources/myobsource.h"
 

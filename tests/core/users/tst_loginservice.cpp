@@ -1,8 +1,8 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
+#include "app/mainconnector.h"
 #include "app/settingsloader.h"
-#include "database/mainconnector.h"
 #include "users/loginservice.h"
 
 #include <QSqlQuery>

@@ -1,9 +1,9 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
+#include "app/mainconnector.h"
 #include "app/settingsloader.h"
 #include "database/configvalues.h"
-#include "database/mainconnector.h"
 #include "users/usercounter.h"
 #include "users/userpoll.h"
 

@@ -1,8 +1,8 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
+#include "app/mainconnector.h"
 #include "app/settingsloader.h"
-#include "database/mainconnector.h"
 #include "setup/celleditor.h"
 #include "setup/hourlyratesdialog.h"
 #include "setup/programsetupdialog.h"

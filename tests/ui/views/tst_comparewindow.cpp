@@ -3,9 +3,9 @@
 #include "testworkspace.h"
 
 #include "app/demoworkspace.h"
+#include "app/mainconnector.h"
+#include "app/producecommand.h"
 #include "app/settingsloader.h"
-#include "database/mainconnector.h"
-#include "engine/producecommand.h"
 #include "main/mainwindow.h"
 #include "report/gifencoder.h"
 #include "report/printwindow.h"
