@@ -3,11 +3,11 @@
 
 #include "app/appcontext.h"
 #include "app/demoworkspace.h"
-#include "app/recordingprompter.h"
+#include "app/mainconnector.h"
+#include "app/producecommand.h"
 #include "app/settingsloader.h"
-#include "app/settingsstore.h"
-#include "database/mainconnector.h"
-#include "engine/producecommand.h"
+#include "common/recordingprompter.h"
+#include "common/settingsstore.h"
 
 #include <QTemporaryDir>
 #include <QTextStream>

@@ -5,9 +5,9 @@
 
 #include "app/appcontext.h"
 #include "app/demoworkspace.h"
-#include "app/recordingprompter.h"
-#include "app/settingsstore.h"
 #include "app/startupsequence.h"
+#include "common/recordingprompter.h"
+#include "common/settingsstore.h"
 #include "main/mainwindow.h"
 
 #include <QApplication>

@@ -6,10 +6,11 @@
 // under 60 ms.
 
 #include "app/appcontext.h"
-#include "app/recordingprompter.h"
+#include "app/contextwiring.h"
+#include "app/mainconnector.h"
 #include "app/settingsloader.h"
-#include "app/settingsstore.h"
-#include "database/mainconnector.h"
+#include "common/recordingprompter.h"
+#include "common/settingsstore.h"
 #include "engine/rangeloader.h"
 #include "sources/companyfile.h"
 #include "sources/companyfilewriter.h"
@@ -191,12 +192,13 @@ int main(int argc, char *argv[])
     PeriodDataSet &data = context.periodDataSet();
     const auto programYear = [&] {
         data.setCurrentSlot(0);
-        RangeLoader(context).loadDateRange(yearStart, yearEnd);
+        ContextWiring::rangeLoader(context).loadDateRange(yearStart, yearEnd);
     };
     const auto programComparison = [&] {
         for (int slot = 1; slot <= 4; ++slot) {
             data.setCurrentSlot(quint8(slot));
-            RangeLoader(context).loadDateRange(yearStart.addYears(-slot), yearEnd.addYears(-slot));
+            ContextWiring::rangeLoader(context).loadDateRange(yearStart.addYears(-slot),
+                                                              yearEnd.addYears(-slot));
         }
     };
     double sink = 0.0;

@@ -10,16 +10,17 @@
 //   sharebench [SECONDS] [WRITER_PAUSE_MS]      (default 180 and 2000)
 
 #include "app/appcontext.h"
+#include "app/contextwiring.h"
 #include "app/demoworkspace.h"
-#include "app/recordingprompter.h"
+#include "app/mainconnector.h"
+#include "app/producecommand.h"
 #include "app/settingsloader.h"
-#include "app/settingsstore.h"
-#include "database/mainconnector.h"
-#include "engine/producecommand.h"
+#include "common/recordingprompter.h"
+#include "common/settingsstore.h"
 #include "engine/rangeloader.h"
+#include "grid/gridoperations.h"
 #include "setup/hourlyrates.h"
 #include "setup/programsetup.h"
-#include "views/gridoperations.h"
 
 #include <QCoreApplication>
 #include <QDeadlineTimer>
@@ -58,7 +59,7 @@ int writer(const QString &demo, const QString &appFolder, int seconds, int pause
     int failures = 0;
     const QDeadlineTimer deadline(seconds * 1000);
     for (int generation = 1; !deadline.hasExpired(); ++generation) {
-        HourlyRates rates(*context);
+        HourlyRates rates(context->mainDatabase(), context->prompter(), context->numberFormat());
         rates.load();
         rates.commitEdit(GridOperations::findGridRow(rates.grid(), 1, u"1"_s),
                          QString::number(100 + generation));
@@ -66,7 +67,7 @@ int writer(const QString &demo, const QString &appFolder, int seconds, int pause
                          QString::number(200 + generation));
         failures += rates.save() ? 0 : 1;
 
-        ProgramSetup setup(*context);
+        ProgramSetup setup(context->mainDatabase(), context->prompter());
         setup.load();
         GridModel &mapping = setup.grid(ProgramSetup::Mapping);
         const int row = GridOperations::findGridRow(mapping, 1, u"13"_s);
@@ -125,7 +126,7 @@ int main(int argc, char *argv[])
             continue;
         }
         ++produces;
-        RangeLoader loader(*context);
+        RangeLoader loader = ContextWiring::rangeLoader(*context);
         const int rate1 = int(loader.hourlyRate(1)) - 100;
         const int rate2 = int(loader.hourlyRate(2)) - 200;
         RecordSet &fields = context->mainDatabase().fieldsRecordset();

@@ -4,10 +4,10 @@
 // the SQL driver) and the spread of the warm runs after it. Target: under 150 ms warm.
 
 #include "app/appcontext.h"
-#include "app/recordingprompter.h"
+#include "app/mainconnector.h"
 #include "app/settingsloader.h"
-#include "app/settingsstore.h"
-#include "database/mainconnector.h"
+#include "common/recordingprompter.h"
+#include "common/settingsstore.h"
 #include "engine/cachefile.h"
 
 #include <QCoreApplication>

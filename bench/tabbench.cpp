@@ -4,7 +4,8 @@
 
 #include "demosession.h"
 
-#include "views/gridmodel.h"
+#include "app/contextwiring.h"
+#include "grid/gridmodel.h"
 #include "views/tabviewbuilder.h"
 
 #include <QCoreApplication>
@@ -28,7 +29,7 @@ int main(int argc, char *argv[])
 
     GridModel grid;
     TabViewBuilder::addMainColumns(grid);
-    TabViewBuilder builder(context, grid);
+    TabViewBuilder builder = ContextWiring::tabViewBuilder(context, grid);
     builder.buildTabView(0, 0); // warm
 
     QList<double> timings;

@@ -2,10 +2,10 @@
 
 #include "app/appcontext.h"
 #include "app/loadingwindow.h"
-#include "app/prompter.h"
 #include "app/qtprompter.h"
-#include "app/settingsstore.h"
 #include "app/shutdown.h"
+#include "common/prompter.h"
+#include "common/settingsstore.h"
 #include "main/mainwindow.h"
 
 #include <QApplication>

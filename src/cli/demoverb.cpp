@@ -1,9 +1,9 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "demoverb.h"
 
-#include "app/applocations.h"
 #include "app/demoworkspace.h"
-#include "app/settingsstore.h"
+#include "common/applocations.h"
+#include "common/settingsstore.h"
 
 #include <QDir>
 #include <QFileInfo>

@@ -2,11 +2,12 @@
 #include "headlesssession.h"
 
 #include "app/appcontext.h"
-#include "app/consoleprompter.h"
-#include "app/settingsstore.h"
+#include "app/contextwiring.h"
+#include "app/mainconnector.h"
+#include "app/producecommand.h"
 #include "app/startupsequence.h"
-#include "database/mainconnector.h"
-#include "engine/producecommand.h"
+#include "common/consoleprompter.h"
+#include "common/settingsstore.h"
 #include "engine/rangeloader.h"
 #include "users/loginservice.h"
 
@@ -211,7 +212,8 @@ void Session::loadComparison(const Options &options)
     const auto ranges =
         ComparisonRanges::earlierRanges(data.range(0), *options.compareKind, options.compareCount);
     for (int slot = 1; slot <= ranges.size(); ++slot)
-        RangeLoader(*m_context).loadSlot(slot, ranges[slot - 1].start, ranges[slot - 1].end);
+        ContextWiring::rangeLoader(*m_context)
+            .loadSlot(slot, ranges[slot - 1].start, ranges[slot - 1].end);
     data.setCurrentSlot(0);
 }
 

@@ -1,8 +1,8 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "passwordverbs.h"
 
-#include "app/settings.h"
 #include "cipher/passwordcipher.h"
+#include "common/settings.h"
 
 #include <QTextStream>
 

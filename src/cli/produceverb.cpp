@@ -4,8 +4,9 @@
 #include "headlesssession.h"
 
 #include "app/appcontext.h"
+#include "app/contextwiring.h"
+#include "grid/gridmodel.h"
 #include "users/loginservice.h"
-#include "views/gridmodel.h"
 #include "views/kpievaluation.h"
 #include "views/tabviewbuilder.h"
 
@@ -56,7 +57,7 @@ QList<Record> recordsOfSlot(AppContext &context, int slot)
 {
     GridModel grid;
     TabViewBuilder::addMainColumns(grid);
-    TabViewBuilder(context, grid).buildSlotView(0, slot);
+    ContextWiring::tabViewBuilder(context, grid).buildSlotView(0, slot);
     const int valueColumn = grid.columnIndex(u"value"_s);
 
     QList<Record> records;

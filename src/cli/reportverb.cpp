@@ -4,8 +4,8 @@
 #include "headlesssession.h"
 
 #include "app/appcontext.h"
-#include "app/fileoperations.h"
-#include "app/settingsstore.h"
+#include "common/fileoperations.h"
+#include "common/settingsstore.h"
 #include "report/gridhtml.h"
 #include "report/gridreport.h"
 #include "report/pagesetup.h"

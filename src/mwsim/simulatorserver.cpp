@@ -1,8 +1,8 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "simulatorserver.h"
 
-#include "app/numberformat.h"
-#include "engine/rounding.h"
+#include "common/numberformat.h"
+#include "common/rounding.h"
 #include "sources/companyfile.h"
 #include "sources/myobsource.h"
 #include "sources/shortdate.h"

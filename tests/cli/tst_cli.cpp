@@ -1,6 +1,6 @@
 // Veltrix — KPI dashboard for small businesses.
-#include "app/settings.h"
 #include "cipher/passwordcipher.h"
+#include "common/settings.h"
 
 #include "database/sqliteconnection.h"
 #include "sources/companyfile.h"

@@ -5,9 +5,9 @@
 
 #include "simulatorprocess.h"
 
-#include "app/settings.h"
-#include "app/settingsstore.h"
 #include "cipher/passwordcipher.h"
+#include "common/settings.h"
+#include "common/settingsstore.h"
 #include "database/sqliteconnection.h"
 #include "sources/companyfile.h"
 

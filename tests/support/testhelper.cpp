@@ -2,7 +2,7 @@
 // A second process for tests that need one: another copy of the program writing the shared
 // database, or a writer that is killed in the middle of its work.
 
-#include "app/recordingprompter.h"
+#include "common/recordingprompter.h"
 #include "database/configvalues.h"
 #include "database/maindatabase.h"
 #include "engine/cachefile.h"

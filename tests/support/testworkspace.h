@@ -2,10 +2,10 @@
 #pragma once
 
 #include "app/appcontext.h"
-#include "app/recordingprompter.h"
+#include "app/mainconnector.h"
 #include "app/settingsloader.h"
-#include "app/settingsstore.h"
-#include "database/mainconnector.h"
+#include "common/recordingprompter.h"
+#include "common/settingsstore.h"
 #include "database/sqliteconnection.h"
 
 #include <QDir>

@@ -1,7 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "appcontext.h"
 
-#include "settingsstore.h"
+#include "common/settingsstore.h"
 
 #include "sources/accountingsource.h"
 

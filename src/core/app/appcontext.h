@@ -1,11 +1,12 @@
 // Veltrix — KPI dashboard for small businesses.
 #pragma once
 
-#include "applocations.h"
-#include "clock.h"
-#include "numberformat.h"
-#include "settings.h"
-#include "workingfolder.h"
+#include "common/applocations.h"
+#include "common/busystate.h"
+#include "common/clock.h"
+#include "common/numberformat.h"
+#include "common/settings.h"
+#include "common/workingfolder.h"
 
 #include "database/maindatabase.h"
 #include "engine/perioddataset.h"
@@ -50,25 +51,9 @@ public:
     AccountingSource *accountingSource() const { return m_accountingSource.get(); }
     void setAccountingSource(std::unique_ptr<AccountingSource> source);
 
-    // Held while a produce or a load runs. A network source waits for its answers in an event
-    // loop, where timers still fire; what they would tear down (the source, the database,
-    // the program) has to wait until the work is done.
-    class BusyScope
-    {
-    public:
-        explicit BusyScope(AppContext &context)
-            : m_context(context)
-        {
-            ++m_context.m_busyDepth;
-        }
-        ~BusyScope() { --m_context.m_busyDepth; }
-        BusyScope(const BusyScope &) = delete;
-        BusyScope &operator=(const BusyScope &) = delete;
-
-    private:
-        AppContext &m_context;
-    };
-    bool isBusy() const { return m_busyDepth > 0; }
+    // Whether a produce or a load is under way: requests from other copies wait for its end.
+    BusyState &busyState() { return m_busy; }
+    bool isBusy() const { return m_busy.isBusy(); }
 
     // The height of a horizontal scroll bar on this desktop; the windows set it, since only
     // they know the style in use.
@@ -90,5 +75,5 @@ private:
     WebPageOpener m_webPageOpener;
     std::unique_ptr<AccountingSource> m_accountingSource;
     int m_platformScrollBarHeight = 16;
-    int m_busyDepth = 0;
+    BusyState m_busy;
 };

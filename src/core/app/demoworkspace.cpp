@@ -1,10 +1,10 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "demoworkspace.h"
 
-#include "fileoperations.h"
-#include "settingsstore.h"
+#include "common/fileoperations.h"
+#include "common/settingsstore.h"
 
-#include "settings.h"
+#include "common/settings.h"
 
 #include "cipher/passwordcipher.h"
 #include "database/sqliteconnection.h"

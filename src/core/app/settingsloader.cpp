@@ -3,9 +3,9 @@
 
 #include "appcontext.h"
 #include "cipher/passwordcipher.h"
-#include "fileoperations.h"
-#include "prompter.h"
-#include "settingsstore.h"
+#include "common/fileoperations.h"
+#include "common/prompter.h"
+#include "common/settingsstore.h"
 
 #include <QDir>
 #include <QFile>

@@ -1,12 +1,13 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "shutdown.h"
 
+#include "app/contextwiring.h"
 #include "appcontext.h"
-#include "fileoperations.h"
-#include "settingsstore.h"
+#include "common/fileoperations.h"
+#include "common/settingsstore.h"
 
-#include "database/mainconnector.h"
 #include "engine/cachefile.h"
+#include "mainconnector.h"
 #include "users/loginsession.h"
 #include "web/webpageopener.h"
 
@@ -20,7 +21,7 @@ void shutDown(AppContext &context)
         CacheFile::write(context.settings().cacheFile, slot0);
 
     if (context.loginState().loggedIn && context.mainDatabase().isConnected())
-        LoginSession(context).logoff(false);
+        ContextWiring::loginSession(context).logoff(false);
 
     context.webPageOpener().closeWindow();
     disconnectMainDatabase(context);

@@ -4,7 +4,7 @@
 #include "appcontext.h"
 #include "settingsloader.h"
 
-#include "database/mainconnector.h"
+#include "mainconnector.h"
 
 using namespace Qt::StringLiterals;
 

@@ -1,10 +1,10 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "systemconfiguration.h"
 
-#include "fileoperations.h"
-#include "prompter.h"
-#include "settings.h"
-#include "settingsstore.h"
+#include "common/fileoperations.h"
+#include "common/prompter.h"
+#include "common/settings.h"
+#include "common/settingsstore.h"
 
 #include "cipher/passwordcipher.h"
 #include "cipher/windows1252.h"

@@ -6,7 +6,7 @@
 #include "keystream.h"
 #include "windows1252.h"
 
-#include "app/texttrim.h"
+#include "common/texttrim.h"
 
 #include <QRandomGenerator>
 

@@ -4,8 +4,8 @@
 #include "maindatabase.h"
 #include "recordoperations.h"
 
-#include "app/prompter.h"
-#include "app/version.h"
+#include "common/prompter.h"
+#include "common/version.h"
 
 using namespace Qt::StringLiterals;
 

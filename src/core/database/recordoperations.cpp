@@ -3,8 +3,8 @@
 
 #include "maindatabase.h"
 
-#include "app/errorreporter.h"
-#include "app/prompter.h"
+#include "common/errorreporter.h"
+#include "common/prompter.h"
 
 using namespace Qt::StringLiterals;
 

@@ -1,9 +1,9 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "perioddataset.h"
 
-#include "rounding.h"
+#include "common/rounding.h"
 
-#include "app/numberformat.h"
+#include "common/numberformat.h"
 
 #include <QLocale>
 

@@ -4,15 +4,23 @@
 #include "formulatable.h"
 #include "perioddataset.h"
 
-#include "app/appcontext.h"
-#include "app/prompter.h"
+#include "common/busystate.h"
+#include "common/numberformat.h"
+#include "common/prompter.h"
+#include "database/maindatabase.h"
 #include "database/recordoperations.h"
 #include "sources/accountingsource.h"
 
 using namespace Qt::StringLiterals;
 
-RangeLoader::RangeLoader(AppContext &context)
-    : m_context(context)
+RangeLoader::RangeLoader(PeriodDataSet &data, MainDatabase &database, AccountingSource *source,
+                         Prompter &prompter, const NumberFormat &numbers, BusyState &busy)
+    : m_data(data)
+    , m_database(database)
+    , m_source(source)
+    , m_prompter(prompter)
+    , m_numbers(numbers)
+    , m_busy(busy)
 {}
 
 int RangeLoader::workingDays(const QDate &start, const QDate &end)
@@ -27,17 +35,16 @@ int RangeLoader::workingDays(const QDate &start, const QDate &end)
 
 double RangeLoader::hourlyRate(int recordId)
 {
-    RecordSet &hours = m_context.mainDatabase().hoursRecordset();
-    if (!RecordOperations(m_context.mainDatabase(), m_context.prompter())
-             .findRecordById(hours, recordId))
+    RecordSet &hours = m_database.hoursRecordset();
+    if (!RecordOperations(m_database, m_prompter).findRecordById(hours, recordId))
         return 0.0;
     const QVariant rate = hours.value(u"Value"_s);
-    return rate.isNull() ? 0.0 : m_context.numberFormat().toNumber(rate);
+    return rate.isNull() ? 0.0 : m_numbers.toNumber(rate);
 }
 
 void RangeLoader::loadSlot(int slot, const QDate &start, const QDate &end)
 {
-    PeriodDataSet &data = m_context.periodDataSet();
+    PeriodDataSet &data = m_data;
     data.setRange(slot, {start, end});
     data.setCurrentSlot(quint8(slot));
     loadDateRange(start, end);
@@ -45,20 +52,20 @@ void RangeLoader::loadSlot(int slot, const QDate &start, const QDate &end)
 
 void RangeLoader::loadDateRange(const QDate &start, const QDate &end)
 {
-    const BusyPointer busyPointer(m_context.prompter());
-    const AppContext::BusyScope busy(m_context);
+    const BusyPointer busyPointer(m_prompter);
+    const BusyState::Scope busy(m_busy);
     const int daySpan = int(start.daysTo(end));
     const int working = workingDays(start, end);
     const bool beyondPeriod = outOfRange(start, end);
 
-    PeriodDataSet &data = m_context.periodDataSet();
+    PeriodDataSet &data = m_data;
     const int slot = data.currentSlot();
     data.clearCurrent();
     data.setFilling(slot, true);
     if (!beyondPeriod)
         loadAccountFigures(start, end);
 
-    AccountingSource *source = m_context.accountingSource();
+    AccountingSource *source = m_source;
     const int jobs = source ? source->jobsCount(start, end) : 0;
     computeFormulas(daySpan, working, jobs);
     data.setFilling(slot, false);
@@ -66,7 +73,7 @@ void RangeLoader::loadDateRange(const QDate &start, const QDate &end)
 
 bool RangeLoader::outOfRange(const QDate &start, const QDate &end)
 {
-    AccountingSource *source = m_context.accountingSource();
+    AccountingSource *source = m_source;
     if (!source)
         return false;
     const std::optional<QDate> periodEnd = source->currentPeriodEnd();
@@ -75,13 +82,13 @@ bool RangeLoader::outOfRange(const QDate &start, const QDate &end)
     // A period end that cannot be read counts as the earliest date: nothing is in range.
     if (periodEnd->isValid() && end <= *periodEnd)
         return false;
-    const QLocale &locale = m_context.numberFormat().locale();
+    const QLocale &locale = m_numbers.locale();
     const auto shortDate = [&](const QDate &date) {
         return date.isValid() ? locale.toString(date, QLocale::ShortFormat) : QString();
     };
     const QString range =
         u"The selected date range "_s + shortDate(start) + u" to "_s + shortDate(end);
-    m_context.prompter().message(
+    m_prompter.message(
         periodEnd->isValid()
             ? range + u" exceeds the\r\naccounting period of your MoneyWorks file which ends "_s +
                   shortDate(*periodEnd) + u"!"_s
@@ -93,11 +100,11 @@ bool RangeLoader::outOfRange(const QDate &start, const QDate &end)
 
 void RangeLoader::loadAccountFigures(const QDate &start, const QDate &end)
 {
-    RecordSet &fields = m_context.mainDatabase().fieldsRecordset();
+    RecordSet &fields = m_database.fieldsRecordset();
     if (fields.moveFirst())
         return;
-    AccountingSource *source = m_context.accountingSource();
-    PeriodDataSet &data = m_context.periodDataSet();
+    AccountingSource *source = m_source;
+    PeriodDataSet &data = m_data;
     // A record set closed under the load (a disconnect) has no current record: the loop ends.
     for (; fields.hasCurrentRecord(); fields.moveNext()) {
         const int type = fields.value(u"Type"_s).toInt();
@@ -116,7 +123,7 @@ void RangeLoader::loadAccountFigures(const QDate &start, const QDate &end)
 
 void RangeLoader::computeFormulas(int daySpan, int workingDays, int jobs)
 {
-    PeriodDataSet &data = m_context.periodDataSet();
+    PeriodDataSet &data = m_data;
     Formula::Inputs inputs;
     inputs.value = [&](int id) { return data.getFieldValue(id); };
     inputs.magnitude = [&](int id) { return data.getFieldAbs(id); };

@@ -3,7 +3,12 @@
 
 #include <QDate>
 
-class AppContext;
+class AccountingSource;
+class BusyState;
+class MainDatabase;
+class NumberFormat;
+class PeriodDataSet;
+class Prompter;
 
 // Fills the current period slot with every KPI figure of one date range: the account-mapped
 // Fields summed from the accounting package, then the derived Fields of the formula table.
@@ -12,7 +17,9 @@ class AppContext;
 class RangeLoader
 {
 public:
-    explicit RangeLoader(AppContext &context);
+    // The source may be null (nothing reached yet): every account figure then counts as 0.
+    RangeLoader(PeriodDataSet &data, MainDatabase &database, AccountingSource *source,
+                Prompter &prompter, const NumberFormat &numbers, BusyState &busy);
 
     void loadDateRange(const QDate &start, const QDate &end);
     // Records the range as the slot's, makes the slot current and loads it.
@@ -28,5 +35,10 @@ private:
     void loadAccountFigures(const QDate &start, const QDate &end);
     void computeFormulas(int daySpan, int workingDays, int jobs);
 
-    AppContext &m_context;
+    PeriodDataSet &m_data;
+    MainDatabase &m_database;
+    AccountingSource *m_source;
+    Prompter &m_prompter;
+    const NumberFormat &m_numbers;
+    BusyState &m_busy;
 };

@@ -1,7 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "rangeselection.h"
 
-#include "app/settingsstore.h"
+#include "common/settingsstore.h"
 
 using namespace Qt::StringLiterals;
 

@@ -1,8 +1,6 @@
 // Veltrix — KPI dashboard for small businesses.
 #pragma once
 
-#include "producecommand.h"
-
 #include <QString>
 
 #include <optional>
@@ -15,7 +13,13 @@ namespace RangeSelection {
 
 inline constexpr int EarliestYear = 1950;
 
-using Selection = ProduceCommand::Selection; // months 1 to 12
+struct Selection
+{
+    int firstMonth = 1; // 1 to 12
+    int firstYear = 0;
+    int lastMonth = 1;
+    int lastYear = 0;
+};
 
 // Each step gives the new choice, or nothing when it would pass a limit.
 std::optional<Selection> previousMonth(const Selection &selection);

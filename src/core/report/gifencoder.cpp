@@ -1,7 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "gifencoder.h"
 
-#include "engine/rounding.h"
+#include "common/rounding.h"
 
 #include <QCoreApplication>
 #include <QSaveFile>

@@ -3,7 +3,7 @@
 
 #include "gifencoder.h"
 
-#include "app/fileoperations.h"
+#include "common/fileoperations.h"
 
 #include <QImageReader>
 #include <QPainter>

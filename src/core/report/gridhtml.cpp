@@ -1,8 +1,8 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "gridhtml.h"
 
-#include "app/fileoperations.h"
-#include "views/gridmodel.h"
+#include "common/fileoperations.h"
+#include "grid/gridmodel.h"
 
 #include <cmath>
 

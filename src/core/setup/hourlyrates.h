@@ -3,9 +3,11 @@
 
 #include "setuplist.h"
 
-#include "views/gridmodel.h"
+#include "grid/gridmodel.h"
 
-class AppContext;
+class MainDatabase;
+class Prompter;
+class NumberFormat;
 
 // The Labour Hours list: one hourly rate per department, kept in the Hours table and read by
 // the formulas that cost labour.
@@ -15,7 +17,7 @@ public:
     static constexpr int RateColumn = 3;
     static constexpr int RateWidth = 100;
 
-    explicit HourlyRates(AppContext &context);
+    HourlyRates(MainDatabase &database, Prompter &prompter, const NumberFormat &numbers);
 
     // Reads the departments and their rates; the rate cells are marked editable.
     void load();
@@ -27,7 +29,9 @@ public:
     bool save();
 
 private:
-    AppContext &m_context;
+    MainDatabase &m_database;
+    Prompter &m_prompter;
+    const NumberFormat &m_numbers;
     GridModel m_grid;
     SetupList m_list;
 };

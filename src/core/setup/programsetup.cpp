@@ -1,11 +1,11 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "programsetup.h"
 
-#include "app/appcontext.h"
-#include "app/errorreporter.h"
+#include "common/errorreporter.h"
+#include "common/prompter.h"
 #include "database/maindatabase.h"
 #include "database/recordoperations.h"
-#include "views/gridoperations.h"
+#include "grid/gridoperations.h"
 
 using namespace Qt::StringLiterals;
 
@@ -23,8 +23,9 @@ void addColumns(GridModel &grid, const QString &labelHeader, const QString &data
 
 } // namespace
 
-ProgramSetup::ProgramSetup(AppContext &context)
-    : m_context(context)
+ProgramSetup::ProgramSetup(MainDatabase &database, Prompter &prompter)
+    : m_database(database)
+    , m_prompter(prompter)
     , m_mappingList(m_mapping, {DataColumn, TypeColumn})
     , m_benchmarkList(m_benchmarks, {DataColumn, TypeColumn})
 {}
@@ -33,11 +34,11 @@ void ProgramSetup::load()
 {
     addColumns(m_mapping, u"Account"_s, u"Code/s"_s, 120);
     addColumns(m_benchmarks, u"Field"_s, u"Optimal %"_s, 65);
-    MainDatabase &database = m_context.mainDatabase();
-    const ErrorReporter errors(m_context.prompter());
+    MainDatabase &database = m_database;
+    const ErrorReporter errors(m_prompter);
     // Read the standing Fields again, so that the save compares with what these lists show.
     database.requeryFields();
-    const RecordOperations operations(database, m_context.prompter());
+    const RecordOperations operations(database, m_prompter);
     // In catalogue order, so that every heading stands above its fields; the IDs do not
     // follow it.
     const std::pair<GridModel *, QString> lists[] = {
@@ -69,14 +70,14 @@ void ProgramSetup::commitEdit(List list, int row, const QString &text)
 
 bool ProgramSetup::save()
 {
-    MainDatabase &database = m_context.mainDatabase();
+    MainDatabase &database = m_database;
     const auto asText = [](const QString &text) { return QVariant(text); };
     const QString context = u"Save Program Setup"_s;
-    const bool saved = SetupList::saveTogether(m_context, context, [&] {
-        return m_mappingList.saveInto(m_context, database.fieldsRecordset(), u"Fields"_s, u"Data"_s,
-                                      asText, context) &&
-               m_benchmarkList.saveInto(m_context, database.fieldsRecordset(), u"Fields"_s,
-                                        u"Data"_s, asText, context);
+    const bool saved = SetupList::saveTogether(m_database, m_prompter, context, [&] {
+        return m_mappingList.saveInto(m_database, m_prompter, database.fieldsRecordset(),
+                                      u"Fields"_s, u"Data"_s, asText, context) &&
+               m_benchmarkList.saveInto(m_database, m_prompter, database.fieldsRecordset(),
+                                        u"Fields"_s, u"Data"_s, asText, context);
     });
     database.requeryFields();
     return saved;

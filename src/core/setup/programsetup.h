@@ -3,9 +3,10 @@
 
 #include "setuplist.h"
 
-#include "views/gridmodel.h"
+#include "grid/gridmodel.h"
 
-class AppContext;
+class MainDatabase;
+class Prompter;
 
 // The Program Setup lists: the accounting codes of every account field ("Account Code
 // Mapping") and the benchmark of every KPI field ("Benchmark Percentages"), both kept in the
@@ -18,7 +19,7 @@ public:
     static constexpr int DataColumn = 4;
     enum List { Mapping = 0, Benchmarks = 1 };
 
-    explicit ProgramSetup(AppContext &context);
+    ProgramSetup(MainDatabase &database, Prompter &prompter);
 
     void load();
     GridModel &grid(List list) { return list == Mapping ? m_mapping : m_benchmarks; }
@@ -30,7 +31,8 @@ public:
     bool save();
 
 private:
-    AppContext &m_context;
+    MainDatabase &m_database;
+    Prompter &m_prompter;
     GridModel m_mapping;
     GridModel m_benchmarks;
     SetupList m_mappingList;

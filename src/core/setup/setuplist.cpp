@@ -1,8 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "setuplist.h"
 
-#include "app/appcontext.h"
-#include "app/errorreporter.h"
+#include "common/errorreporter.h"
 #include "database/databasetransaction.h"
 #include "database/maindatabase.h"
 #include "database/recordoperations.h"
@@ -25,9 +24,9 @@ namespace {
 
 // Whether the row is still in the table; a failed look-up counts as present, so that the
 // failure is reported rather than passed over.
-bool rowExists(AppContext &context, const QString &table, qint64 id)
+bool rowExists(MainDatabase &database, Prompter &prompter, const QString &table, qint64 id)
 {
-    QSqlQuery query(context.mainDatabase().database());
+    QSqlQuery query(database.database());
     query.prepare(u"SELECT COUNT(*) FROM \""_s + table + u"\" WHERE ID = ?"_s);
     query.addBindValue(id);
     return !query.exec() || !query.next() || query.value(0).toInt() > 0;
@@ -35,11 +34,11 @@ bool rowExists(AppContext &context, const QString &table, qint64 id)
 
 } // namespace
 
-bool SetupList::saveInto(AppContext &context, RecordSet &records, const QString &table,
-                         const QString &field, const Conversion &conversion,
+bool SetupList::saveInto(MainDatabase &database, Prompter &prompter, RecordSet &records,
+                         const QString &table, const QString &field, const Conversion &conversion,
                          const QString &errorContext) const
 {
-    const RecordOperations operations(context.mainDatabase(), context.prompter());
+    const RecordOperations operations(database, prompter);
     for (int row = 1; row <= m_grid.rowCount(); ++row) {
         if (isHeading(row))
             continue;
@@ -59,24 +58,21 @@ bool SetupList::saveInto(AppContext &context, RecordSet &records, const QString 
         if (!failure)
             continue;
         records.cancelUpdate();
-        if (failure->number == DbError::RowNotFound && !rowExists(context, table, id))
+        if (failure->number == DbError::RowNotFound && !rowExists(database, prompter, table, id))
             continue;
-        ErrorReporter(context.prompter())
-            .reportError(failure->number, failure->description, errorContext);
+        ErrorReporter(prompter).reportError(failure->number, failure->description, errorContext);
         return false;
     }
     return true;
 }
 
-bool SetupList::saveTogether(AppContext &context, const QString &errorContext,
-                             const std::function<bool()> &saves)
+bool SetupList::saveTogether(MainDatabase &database, Prompter &prompter,
+                             const QString &errorContext, const std::function<bool()> &saves)
 {
-    DatabaseTransaction transaction(context.mainDatabase().database(),
-                                    DatabaseTransaction::Kind::Write);
+    DatabaseTransaction transaction(database.database(), DatabaseTransaction::Kind::Write);
     const bool saved = !transaction.beginError() && saves();
     if (const std::optional<DbError> failure = transaction.commit()) {
-        ErrorReporter(context.prompter())
-            .reportError(failure->number, failure->description, errorContext);
+        ErrorReporter(prompter).reportError(failure->number, failure->description, errorContext);
         return false;
     }
     return saved;

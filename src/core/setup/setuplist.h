@@ -1,7 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #pragma once
 
-#include "views/gridmodel.h"
+#include "grid/gridmodel.h"
 
 #include <QHash>
 #include <QString>
@@ -9,7 +9,8 @@
 
 #include <functional>
 
-class AppContext;
+class MainDatabase;
+class Prompter;
 class RecordSet;
 
 // One editable list of a setup dialog: rows read from a table, one editable column, and a
@@ -38,15 +39,15 @@ public:
     // value is not written again. A change that meets another copy's change, or any other
     // failure, stops the save and is reported under the error context; rows written before
     // it stay written. False after a failure.
-    bool saveInto(AppContext &context, RecordSet &records, const QString &table,
-                  const QString &field, const Conversion &conversion,
+    bool saveInto(MainDatabase &database, Prompter &prompter, RecordSet &records,
+                  const QString &table, const QString &field, const Conversion &conversion,
                   const QString &errorContext) const;
 
     // Runs the saves in one transaction, so that another copy reads all of their changes or
     // none. Rows written before a failure stay written, as they would one by one. False when
     // a save or the transaction failed; every failure is reported under the error context.
-    static bool saveTogether(AppContext &context, const QString &errorContext,
-                             const std::function<bool()> &saves);
+    static bool saveTogether(MainDatabase &database, Prompter &prompter,
+                             const QString &errorContext, const std::function<bool()> &saves);
 
     // Remembers the editable texts as the list now shows them. A row whose text is still the
     // same at the save is not written: what is shown may be rounded from what is stored, and

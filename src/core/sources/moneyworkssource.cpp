@@ -3,9 +3,9 @@
 
 #include "shortdate.h"
 
-#include "app/errorreporter.h"
-#include "app/fileoperations.h"
-#include "app/numberformat.h"
+#include "common/errorreporter.h"
+#include "common/fileoperations.h"
+#include "common/numberformat.h"
 
 using namespace Qt::StringLiterals;
 

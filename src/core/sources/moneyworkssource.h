@@ -4,7 +4,7 @@
 #include "accountingsource.h"
 #include "moneyworkslink.h"
 
-#include "app/settings.h"
+#include "common/settings.h"
 
 #include <functional>
 #include <memory>

@@ -4,9 +4,9 @@
 #include "companyfile.h"
 #include "odbcdrivers.h"
 
-#include "app/errorreporter.h"
+#include "common/errorreporter.h"
+#include "common/rounding.h"
 #include "database/sqliteconnection.h"
-#include "engine/rounding.h"
 
 #include <QAtomicInt>
 #include <QLocale>

@@ -3,7 +3,7 @@
 
 #include "accountingsource.h"
 
-#include "app/settings.h"
+#include "common/settings.h"
 
 #include <QSqlDatabase>
 

@@ -5,7 +5,7 @@
 #include "myobsource.h"
 #include "restmoneyworkslink.h"
 
-#include "app/settings.h"
+#include "common/settings.h"
 
 using namespace Qt::StringLiterals;
 

@@ -5,15 +5,19 @@
 
 #include <optional>
 
-class AppContext;
+class MainDatabase;
+class Prompter;
+struct LoginState;
 
 // Logging in and off on this copy, with the shared count of logged-in users kept in step.
 // The built-in account is never counted.
 class LoginSession
 {
 public:
-    explicit LoginSession(AppContext &context)
-        : m_context(context)
+    LoginSession(MainDatabase &database, Prompter &prompter, LoginState &login)
+        : m_database(database)
+        , m_prompter(prompter)
+        , m_login(login)
     {}
 
     // The users logged in afterwards, as the counter reads; nothing when the credentials do
@@ -24,5 +28,7 @@ public:
     bool logoff(bool reset);
 
 private:
-    AppContext &m_context;
+    MainDatabase &m_database;
+    Prompter &m_prompter;
+    LoginState &m_login;
 };

@@ -1,12 +1,12 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "useraccounts.h"
 
-#include "app/appcontext.h"
-#include "app/errorreporter.h"
-#include "app/prompter.h"
+#include "common/clock.h"
+#include "common/errorreporter.h"
+#include "common/prompter.h"
 #include "database/maindatabase.h"
 #include "database/recordoperations.h"
-#include "views/gridoperations.h"
+#include "grid/gridoperations.h"
 
 using namespace Qt::StringLiterals;
 using namespace GridOperations;
@@ -23,9 +23,12 @@ const QString CannotSave = u"Cannot Save"_s;
 
 } // namespace
 
-UserAccounts::UserAccounts(AppContext &context, QObject *parent)
+UserAccounts::UserAccounts(MainDatabase &database, Prompter &prompter, const Clock &clock,
+                           QObject *parent)
     : QObject(parent)
-    , m_context(context)
+    , m_database(database)
+    , m_prompter(prompter)
+    , m_clock(clock)
 {}
 
 void UserAccounts::load()
@@ -51,7 +54,7 @@ void UserAccounts::load()
 
 void UserAccounts::fillFieldList()
 {
-    RecordSet &records = m_context.mainDatabase().fieldsRecordset();
+    RecordSet &records = m_database.fieldsRecordset();
     m_fields.setRedraw(false);
     m_fields.clear();
     if (!records.moveFirst()) {
@@ -74,9 +77,9 @@ void UserAccounts::refreshForm(bool requery)
 {
     if (requery) {
         const qint64 remembered = m_selectedUserId;
-        RecordSet &records = m_context.mainDatabase().usersRecordset();
+        RecordSet &records = m_database.usersRecordset();
         if (const std::optional<DbError> failure = records.requery()) {
-            ErrorReporter(m_context.prompter())
+            ErrorReporter(m_prompter)
                 .reportError(failure->number, failure->description, u"Refresh Form"_s);
             return;
         }
@@ -167,8 +170,8 @@ void UserAccounts::edit()
 
 void UserAccounts::deleteSelected()
 {
-    MainDatabase &database = m_context.mainDatabase();
-    if (RecordOperations(database, m_context.prompter())
+    MainDatabase &database = m_database;
+    if (RecordOperations(database, m_prompter)
             .deleteRecordById(database.usersRecordset(), m_selectedUserId))
         refreshForm(true);
 }
@@ -210,15 +213,15 @@ QString UserAccounts::tickedFields() const
 
 void UserAccounts::reportSaveFailure(const QString &reason)
 {
-    m_context.prompter().message(reason + u"\r\n\r\nChanges to the user have not been saved!"_s,
-                                 CannotSave, Prompter::Icon::Exclamation);
+    m_prompter.message(reason + u"\r\n\r\nChanges to the user have not been saved!"_s, CannotSave,
+                       Prompter::Icon::Exclamation);
 }
 
 bool UserAccounts::saveUser()
 {
-    MainDatabase &database = m_context.mainDatabase();
+    MainDatabase &database = m_database;
     RecordSet &records = database.usersRecordset();
-    const ErrorReporter errors(m_context.prompter());
+    const ErrorReporter errors(m_prompter);
     const auto failedWith = [&](const DbError &failure) {
         // The account is not saved; whatever was half-written is thrown away.
         records.cancelUpdate();
@@ -236,7 +239,7 @@ bool UserAccounts::saveUser()
     } else if (m_mode == Mode::Adding) {
         DbError failure;
         const std::optional<bool> exists =
-            RecordOperations(database, m_context.prompter())
+            RecordOperations(database, m_prompter)
                 .valueExists(u"Users"_s, u"Username"_s, m_entry.userName, &failure);
         if (!exists)
             return failedWith(failure);
@@ -251,8 +254,7 @@ bool UserAccounts::saveUser()
     if (m_mode == Mode::Adding) {
         if (const std::optional<DbError> failure = records.addNew())
             return failedWith(*failure);
-    } else if (!RecordOperations(database, m_context.prompter())
-                    .findRecordById(records, m_selectedUserId)) {
+    } else if (!RecordOperations(database, m_prompter).findRecordById(records, m_selectedUserId)) {
         // Someone deleted it meanwhile: there is nothing left to edit.
         setEditMode(false);
         m_mode = Mode::Browsing;
@@ -260,7 +262,7 @@ bool UserAccounts::saveUser()
         reportSaveFailure(u"This user account doesn't exist. It may have been deleted!"_s);
         return false;
     }
-    const QString created = QLocale::c().toString(m_context.clock().now(), u"d MMM yyyy h:mm AP"_s);
+    const QString created = QLocale::c().toString(m_clock.now(), u"d MMM yyyy h:mm AP"_s);
     const std::pair<QString, QVariant> values[] = {{u"UserName"_s, m_entry.userName},
                                                    {u"Password"_s, m_entry.password},
                                                    {u"Type"_s, m_entry.type},
@@ -294,7 +296,7 @@ bool UserAccounts::mayClose()
 {
     if (m_mode == Mode::Browsing)
         return true;
-    const Prompter::Answer answer = m_context.prompter().message(
+    const Prompter::Answer answer = m_prompter.message(
         u"Would you like to save changes to the user before closing?"_s, u"Save Changes"_s,
         Prompter::Icon::Question, Prompter::Buttons::YesNoCancel);
     switch (answer) {

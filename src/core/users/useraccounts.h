@@ -1,11 +1,13 @@
 // Veltrix — KPI dashboard for small businesses.
 #pragma once
 
-#include "views/gridmodel.h"
+#include "grid/gridmodel.h"
 
 #include <QObject>
 
-class AppContext;
+class MainDatabase;
+class Prompter;
+class Clock;
 
 // The login accounts as the User Accounts dialog works on them: the list of accounts, the KPI
 // lines with their ticks, the account being shown, added or edited, and every command of the
@@ -29,7 +31,8 @@ public:
     static constexpr int MaxPasswordLength = 8;
     static constexpr int UserNameColumn = 2;
 
-    explicit UserAccounts(AppContext &context, QObject *parent = nullptr);
+    UserAccounts(MainDatabase &database, Prompter &prompter, const Clock &clock,
+                 QObject *parent = nullptr);
 
     // Builds both lists and shows the first account.
     void load();
@@ -81,7 +84,9 @@ private:
     void setEditMode(bool editing);
     void reportSaveFailure(const QString &reason);
 
-    AppContext &m_context;
+    MainDatabase &m_database;
+    Prompter &m_prompter;
+    const Clock &m_clock;
     GridModel m_users;
     GridModel m_fields;
     Entry m_entry;

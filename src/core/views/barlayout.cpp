@@ -1,7 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "barlayout.h"
 
-#include "app/numberformat.h"
+#include "common/numberformat.h"
 
 #include <QLocale>
 

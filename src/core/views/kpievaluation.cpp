@@ -1,8 +1,8 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "kpievaluation.h"
 
-#include "app/numberformat.h"
-#include "engine/rounding.h"
+#include "common/numberformat.h"
+#include "common/rounding.h"
 #include "engine/usualsign.h"
 
 using namespace Qt::StringLiterals;

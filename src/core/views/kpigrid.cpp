@@ -1,11 +1,11 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "kpigrid.h"
 
-#include "gridoperations.h"
+#include "grid/gridoperations.h"
 #include "kpievaluation.h"
 
-#include "app/numberformat.h"
-#include "app/prompter.h"
+#include "common/numberformat.h"
+#include "common/prompter.h"
 #include "database/maindatabase.h"
 #include "database/recordoperations.h"
 #include "engine/perioddataset.h"

@@ -1,7 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #pragma once
 
-#include "gridmodel.h"
+#include "grid/gridmodel.h"
 
 #include <QColor>
 

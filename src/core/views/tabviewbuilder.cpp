@@ -1,14 +1,16 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "tabviewbuilder.h"
 
-#include "gridoperations.h"
+#include "grid/gridoperations.h"
 #include "kpigrid.h"
 
-#include "app/appcontext.h"
-#include "app/prompter.h"
+#include "common/numberformat.h"
+#include "common/prompter.h"
+#include "database/maindatabase.h"
 #include "database/recordoperations.h"
 #include "engine/perioddataset.h"
 #include "users/loginservice.h"
+#include "users/loginstate.h"
 
 using namespace Qt::StringLiterals;
 using namespace GridOperations;
@@ -18,8 +20,14 @@ const QColor RowBack(0xC0, 0xC0, 0xC0);
 const QColor LabelBack(0xF0, 0xF0, 0xF0);
 } // namespace
 
-TabViewBuilder::TabViewBuilder(AppContext &context, GridModel &grid)
-    : m_context(context)
+TabViewBuilder::TabViewBuilder(PeriodDataSet &data, MainDatabase &database, Prompter &prompter,
+                               const NumberFormat &numbers, const LoginState &login,
+                               GridModel &grid)
+    : m_data(data)
+    , m_database(database)
+    , m_prompter(prompter)
+    , m_numbers(numbers)
+    , m_login(login)
     , m_grid(grid)
 {}
 
@@ -67,7 +75,7 @@ void TabViewBuilder::addCompareColumns(GridModel &grid)
 
 void TabViewBuilder::fill(int tab)
 {
-    MainDatabase &database = m_context.mainDatabase();
+    MainDatabase &database = m_database;
     RecordSet &records = tab == 0 ? database.fieldsRecordset() : database.tabRecordset(tab);
     fillGrid(m_grid, records, false);
     numberAndStyleRows();
@@ -75,22 +83,20 @@ void TabViewBuilder::fill(int tab)
 
 void TabViewBuilder::buildSlotView(int tab, int slot)
 {
-    const BusyPointer busy(m_context.prompter());
+    const BusyPointer busy(m_prompter);
     fill(tab);
-    PeriodDataSet &data = m_context.periodDataSet();
+    PeriodDataSet &data = m_data;
     data.setCurrentSlot(quint8(slot));
-    KpiGrid(m_grid, data, m_context.mainDatabase(), m_context.prompter(), m_context.numberFormat())
-        .fillValueColumn(u"value"_s, true);
+    KpiGrid(m_grid, data, m_database, m_prompter, m_numbers).fillValueColumn(u"value"_s, true);
     applyUsersLines();
 }
 
 void TabViewBuilder::buildTabView(int tab, int pastCount)
 {
-    const BusyPointer busy(m_context.prompter());
+    const BusyPointer busy(m_prompter);
     fill(tab);
-    PeriodDataSet &data = m_context.periodDataSet();
-    KpiGrid kpis(m_grid, data, m_context.mainDatabase(), m_context.prompter(),
-                 m_context.numberFormat());
+    PeriodDataSet &data = m_data;
+    KpiGrid kpis(m_grid, data, m_database, m_prompter, m_numbers);
     for (int p = 0; p <= pastCount; ++p) {
         data.setCurrentSlot(quint8(p));
         kpis.fillValueColumn(p == 0 ? u"value"_s : u"value"_s + QString::number(p), pastCount == 0);
@@ -101,9 +107,9 @@ void TabViewBuilder::buildTabView(int tab, int pastCount)
 QList<TabViewBuilder::GraphBar> TabViewBuilder::graphBars(const GridModel &grid, int pastCount)
 {
     QList<GraphBar> bars;
-    PeriodDataSet &data = m_context.periodDataSet();
-    MainDatabase &database = m_context.mainDatabase();
-    const RecordOperations records(database, m_context.prompter());
+    PeriodDataSet &data = m_data;
+    MainDatabase &database = m_database;
+    const RecordOperations records(database, m_prompter);
     const int benchmarkColumn = grid.columnIndex(u"benchmark"_s);
     for (int row = 1; benchmarkColumn && row <= grid.rowCount(); ++row) {
         // A line the user may not see has no bar either.
@@ -147,7 +153,7 @@ void TabViewBuilder::numberAndStyleRows()
 
 void TabViewBuilder::applyUsersLines()
 {
-    const LoginState &login = m_context.loginState();
+    const LoginState &login = m_login;
     if (login.currentUser.toLower() == LoginService::BuiltInUser) {
         for (int row = 1; row <= m_grid.rowCount(); ++row)
             m_grid.setRowVisible(row, true);

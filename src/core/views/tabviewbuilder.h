@@ -3,7 +3,11 @@
 
 #include <QStringList>
 
-class AppContext;
+class PeriodDataSet;
+class MainDatabase;
+class Prompter;
+class NumberFormat;
+class LoginState;
 class GridModel;
 
 // What a tab of the KPI views shows: its Fields as grid rows in order, numbered and styled,
@@ -14,7 +18,8 @@ public:
     static constexpr int TabCount = 7; // "All" and the six tabs of the Fields table
     static constexpr int SummaryTab = 1;
 
-    TabViewBuilder(AppContext &context, GridModel &grid);
+    TabViewBuilder(PeriodDataSet &data, MainDatabase &database, Prompter &prompter,
+                   const NumberFormat &numbers, const LoginState &login, GridModel &grid);
 
     // "&All", "&Summary", ...
     static QStringList tabCaptions();
@@ -46,6 +51,10 @@ private:
     void numberAndStyleRows();
     void applyUsersLines();
 
-    AppContext &m_context;
+    PeriodDataSet &m_data;
+    MainDatabase &m_database;
+    Prompter &m_prompter;
+    const NumberFormat &m_numbers;
+    const LoginState &m_login;
     GridModel &m_grid;
 };

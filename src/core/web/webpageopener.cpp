@@ -1,7 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "webpageopener.h"
 
-#include "app/settingsstore.h"
+#include "common/settingsstore.h"
 
 #include <QDesktopServices>
 #include <QDir>

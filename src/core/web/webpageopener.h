@@ -1,7 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #pragma once
 
-#include "database/dberror.h"
+#include "common/dberror.h"
 
 #include <QRect>
 #include <QSize>

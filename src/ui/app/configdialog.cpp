@@ -1,7 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "configdialog.h"
 
-#include "app/prompter.h"
+#include "common/prompter.h"
 
 #include <QButtonGroup>
 #include <QComboBox>

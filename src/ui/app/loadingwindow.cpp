@@ -5,10 +5,10 @@
 #include "webpages.h"
 
 #include "app/appcontext.h"
-#include "app/prompter.h"
+#include "app/mainconnector.h"
 #include "app/startupsequence.h"
-#include "app/version.h"
-#include "database/mainconnector.h"
+#include "common/prompter.h"
+#include "common/version.h"
 
 #include <QApplication>
 #include <QEvent>

@@ -1,7 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #pragma once
 
-#include "app/prompter.h"
+#include "common/prompter.h"
 
 #include <QPointer>
 #include <QWidget>

@@ -2,8 +2,8 @@
 #include "webpages.h"
 
 #include "app/appcontext.h"
-#include "app/errorreporter.h"
-#include "app/version.h"
+#include "common/errorreporter.h"
+#include "common/version.h"
 #include "web/webpageopener.h"
 
 #include <QScreen>

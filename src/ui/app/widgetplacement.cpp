@@ -1,7 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "widgetplacement.h"
 
-#include "app/windowplacement.h"
+#include "common/windowplacement.h"
 
 #include <QScreen>
 #include <QWidget>

@@ -2,6 +2,7 @@
 #include "mainwindow.h"
 
 #include "app/configdialog.h"
+#include "app/contextwiring.h"
 #include "app/loadingwindow.h"
 #include "app/webpages.h"
 #include "report/gridreport.h"
@@ -15,14 +16,14 @@
 #include "views/tabbuttons.h"
 
 #include "app/appcontext.h"
-#include "app/errorreporter.h"
-#include "app/prompter.h"
-#include "app/settingsstore.h"
+#include "app/mainconnector.h"
+#include "app/producecommand.h"
 #include "app/shutdown.h"
+#include "common/errorreporter.h"
+#include "common/prompter.h"
+#include "common/settingsstore.h"
 #include "database/configvalues.h"
-#include "database/mainconnector.h"
 #include "database/recordoperations.h"
-#include "engine/producecommand.h"
 #include "engine/rangeselection.h"
 #include "users/loginservice.h"
 #include "users/loginsession.h"
@@ -353,7 +354,8 @@ void MainWindow::updateLoginState()
 
 void MainWindow::login(const QString &userName, const QString &password)
 {
-    const std::optional<QString> count = LoginSession(m_context).login(userName, password);
+    const std::optional<QString> count =
+        ContextWiring::loginSession(m_context).login(userName, password);
     if (!count) {
         m_prompter.message(LoginService::LoginFailedMessage, u"Login Failed"_s,
                            Prompter::Icon::Exclamation);
@@ -367,7 +369,7 @@ void MainWindow::login(const QString &userName, const QString &password)
 
 bool MainWindow::logoff(bool reset)
 {
-    if (!LoginSession(m_context).logoff(reset))
+    if (!ContextWiring::loginSession(m_context).logoff(reset))
         return false;
     if (!reset)
         return true;

@@ -1,7 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #pragma once
 
-#include "engine/producecommand.h"
+#include "app/producecommand.h"
 #include "users/userpoll.h"
 
 #include <QHash>

@@ -2,10 +2,10 @@
 #include "printwindow.h"
 
 #include "app/appcontext.h"
-#include "app/fileoperations.h"
-#include "app/numberformat.h"
-#include "app/settingsstore.h"
 #include "app/widgetplacement.h"
+#include "common/fileoperations.h"
+#include "common/numberformat.h"
+#include "common/settingsstore.h"
 #include "report/reportrenderer.h"
 
 #include <QCheckBox>

@@ -1,7 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "celleditor.h"
 
-#include "views/gridmodel.h"
+#include "grid/gridmodel.h"
 #include "views/gridview.h"
 
 #include <QKeyEvent>

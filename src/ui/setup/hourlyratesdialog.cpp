@@ -14,7 +14,7 @@ using namespace Qt::StringLiterals;
 
 HourlyRatesDialog::HourlyRatesDialog(AppContext &context, QWidget *owner)
     : QDialog(owner)
-    , m_rates(context)
+    , m_rates(context.mainDatabase(), context.prompter(), context.numberFormat())
     , m_lstRates(new GridView(m_rates.grid(), this))
     , m_txtEdit(new CellEditor(this))
     , m_butOK(new QPushButton(u"OK"_s, this))

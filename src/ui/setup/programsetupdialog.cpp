@@ -16,7 +16,7 @@ using namespace Qt::StringLiterals;
 
 ProgramSetupDialog::ProgramSetupDialog(AppContext &context, QWidget *owner)
     : QDialog(owner)
-    , m_setup(context)
+    , m_setup(context.mainDatabase(), context.prompter())
     , m_lists{new GridView(m_setup.grid(ProgramSetup::Mapping), this),
               new GridView(m_setup.grid(ProgramSetup::Benchmarks), this)}
     , m_txtEdit(new CellEditor(this))

@@ -38,7 +38,7 @@ QIcon tickIcon(bool ticked)
 
 UserAccountsDialog::UserAccountsDialog(AppContext &context, QWidget *owner)
     : QDialog(owner)
-    , m_accounts(context)
+    , m_accounts(context.mainDatabase(), context.prompter(), context.clock())
     , m_lstUsers(new GridView(m_accounts.users(), this))
     , m_lstFields(new GridView(m_accounts.fields(), this))
     , m_txtUsername(new QLineEdit(this))

@@ -7,9 +7,10 @@
 #include "tabbuttons.h"
 
 #include "app/appcontext.h"
-#include "app/numberformat.h"
-#include "app/settingsstore.h"
+#include "app/contextwiring.h"
 #include "app/widgetplacement.h"
+#include "common/numberformat.h"
+#include "common/settingsstore.h"
 #include "engine/rangeloader.h"
 #include "report/gridreport.h"
 #include "views/tabviewbuilder.h"
@@ -125,7 +126,8 @@ void CompareWindow::loadPeriods()
         const int column = grid.columnIndex(u"value"_s + QString::number(slot));
         grid.setColumnVisible(column, true);
         grid.setColumnHeader(column, rangeHeader(ranges[slot - 1], locale));
-        RangeLoader(m_context).loadSlot(slot, ranges[slot - 1].start, ranges[slot - 1].end);
+        ContextWiring::rangeLoader(m_context).loadSlot(slot, ranges[slot - 1].start,
+                                                       ranges[slot - 1].end);
         m_shpProgress->resize(int(std::lround(step * slot)), ProgressHeight);
         // The window is modal: only its own repaints and input run here.
         QCoreApplication::processEvents();

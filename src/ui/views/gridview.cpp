@@ -3,8 +3,8 @@
 
 #include "gridtablemodel.h"
 
-#include "views/gridmodel.h"
-#include "views/gridoperations.h"
+#include "grid/gridmodel.h"
+#include "grid/gridoperations.h"
 
 #include <QHeaderView>
 #include <QKeyEvent>

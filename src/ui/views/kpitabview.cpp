@@ -6,8 +6,9 @@
 #include "tooltippanel.h"
 
 #include "app/appcontext.h"
+#include "app/contextwiring.h"
 #include "database/recordoperations.h"
-#include "views/gridoperations.h"
+#include "grid/gridoperations.h"
 #include "views/kpigrid.h"
 #include "views/tabviewbuilder.h"
 
@@ -61,7 +62,7 @@ void KpiTabView::showTab(int tab)
     m_tab = tab;
     m_caption->setText(TabViewBuilder::tabCaptions().value(tab).remove(u'&'));
     m_gridView->hide();
-    TabViewBuilder builder(m_context, m_grid);
+    TabViewBuilder builder = ContextWiring::tabViewBuilder(m_context, m_grid);
     builder.buildTabView(tab, m_pastCount);
     if (m_pastCount > 0) {
         KpiGrid(m_grid, m_context.periodDataSet(), m_context.mainDatabase(), m_context.prompter(),

@@ -1,6 +1,6 @@
 // Veltrix — KPI dashboard for small businesses.
-#include "app/errorreporter.h"
-#include "app/recordingprompter.h"
+#include "common/errorreporter.h"
+#include "common/recordingprompter.h"
 
 #include <QTest>
 

@@ -1,6 +1,6 @@
 // Veltrix — KPI dashboard for small businesses.
-#include "app/fileoperations.h"
-#include "app/recordingprompter.h"
+#include "common/fileoperations.h"
+#include "common/recordingprompter.h"
 
 #include <QDir>
 #include <QFile>

@@ -1,5 +1,5 @@
 // Veltrix — KPI dashboard for small businesses.
-#include "app/numberformat.h"
+#include "common/numberformat.h"
 
 #include <QRandomGenerator>
 #include <QTest>

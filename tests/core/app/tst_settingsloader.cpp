@@ -1,9 +1,9 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "app/appcontext.h"
-#include "app/recordingprompter.h"
 #include "app/settingsloader.h"
-#include "app/settingsstore.h"
 #include "cipher/passwordcipher.h"
+#include "common/recordingprompter.h"
+#include "common/settingsstore.h"
 
 #include <QDir>
 #include <QFile>

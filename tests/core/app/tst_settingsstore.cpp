@@ -1,5 +1,5 @@
 // Veltrix — KPI dashboard for small businesses.
-#include "app/settingsstore.h"
+#include "common/settingsstore.h"
 
 #include <QFile>
 #include <QSettings>

@@ -3,7 +3,7 @@
 
 #include "app/shutdown.h"
 #include "app/startupsequence.h"
-#include "app/version.h"
+#include "common/version.h"
 #include "database/configvalues.h"
 #include "engine/cachefile.h"
 #include "sources/accountingsource.h"

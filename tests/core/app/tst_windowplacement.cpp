@@ -1,6 +1,6 @@
 // Veltrix — KPI dashboard for small businesses.
-#include "app/settingsstore.h"
-#include "app/windowplacement.h"
+#include "common/settingsstore.h"
+#include "common/windowplacement.h"
 
 #include <QTemporaryDir>
 #include <QTest>

@@ -1,10 +1,10 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
-#include "app/numberformat.h"
+#include "app/mainconnector.h"
 #include "app/settingsloader.h"
+#include "common/numberformat.h"
 #include "database/configvalues.h"
-#include "database/mainconnector.h"
 #include "database/schemacheck.h"
 
 #include <QProcess>

@@ -1,13 +1,14 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
-#include "engine/producecommand.h"
+#include "app/contextwiring.h"
+#include "app/producecommand.h"
 #include "engine/rangeloader.h"
+#include "grid/gridoperations.h"
 #include "setup/hourlyrates.h"
 #include "setup/programsetup.h"
 #include "sources/accountingsource.h"
 #include "sources/companyfilewriter.h"
-#include "views/gridoperations.h"
 
 #include <QTest>
 
@@ -42,8 +43,9 @@ public:
 
 private:
     TestWorkspace m_workspace;
-    HourlyRates m_rates{m_workspace.context()};
-    ProgramSetup m_setup{m_workspace.context()};
+    HourlyRates m_rates{m_workspace.context().mainDatabase(), m_workspace.prompter(),
+                        m_workspace.context().numberFormat()};
+    ProgramSetup m_setup{m_workspace.context().mainDatabase(), m_workspace.prompter()};
     bool m_ready = false;
 };
 
@@ -235,7 +237,7 @@ void TestProduceCommand::anotherCopysSetupReachesTheNextProduceWhole()
     sqlite3_trace_v2(handle, 0, nullptr, nullptr);
     QVERIFY(!saveBoth); // the produce did read the Fields again
     // Both changes or neither: never the old rate with the new mapping.
-    QCOMPARE(RangeLoader(context).hourlyRate(1) == 50.0, sales == 0.0);
+    QCOMPARE(ContextWiring::rangeLoader(context).hourlyRate(1) == 50.0, sales == 0.0);
 
     // Saved in full, each reaches the next produce. Panel labour hours are the panel labour
     // sales over the panel rate.

@@ -1,6 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
+#include "app/contextwiring.h"
 #include "app/shutdown.h"
 #include "engine/formulatable.h"
 #include "engine/rangeloader.h"
@@ -85,7 +86,7 @@ private:
     {
         context().mainDatabase().requeryFields();
         context().periodDataSet().setCurrentSlot(0);
-        RangeLoader(context()).loadDateRange(from, to);
+        ContextWiring::rangeLoader(context()).loadDateRange(from, to);
     }
     QString storedValue(int id) const
     {
@@ -300,7 +301,7 @@ void TestRangeLoader::periodLimit()
 
 void TestRangeLoader::hourlyRates()
 {
-    RangeLoader loader(context());
+    RangeLoader loader = ContextWiring::rangeLoader(context());
     QCOMPARE(loader.hourlyRate(1), 98.0);
     QCOMPARE(loader.hourlyRate(2), 104.0);
     QCOMPARE(loader.hourlyRate(3), 0.0);

@@ -1,6 +1,6 @@
 // Veltrix — KPI dashboard for small businesses.
+#include "grid/gridmodel.h"
 #include "report/gridhtml.h"
-#include "views/gridmodel.h"
 
 #include <QTemporaryDir>
 #include <QTest>

@@ -2,8 +2,9 @@
 #include "simulatorprocess.h"
 #include "testworkspace.h"
 
+#include "app/contextwiring.h"
+#include "app/mainconnector.h"
 #include "app/settingsloader.h"
-#include "database/mainconnector.h"
 #include "engine/rangeloader.h"
 #include "sources/companyfilewriter.h"
 #include "sources/moneyworkssource.h"
@@ -323,7 +324,7 @@ void TestMoneyWorksSource::periodEnd()
     workspace.context().setAccountingSource(std::move(source));
     workspace.prompter().clearMessages();
 
-    RangeLoader(workspace.context()).loadDateRange(QDate(2025, 7, 1), end);
+    ContextWiring::rangeLoader(workspace.context()).loadDateRange(QDate(2025, 7, 1), end);
     const QList<RecordingPrompter::Message> &messages = workspace.prompter().messages();
     QCOMPARE(messages.size(), refused ? 1 : 0);
     const PeriodDataSet &data = workspace.context().periodDataSet();

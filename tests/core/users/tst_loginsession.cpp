@@ -1,6 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
+#include "app/contextwiring.h"
 #include "database/configvalues.h"
 #include "users/loginsession.h"
 
@@ -47,7 +48,7 @@ void TestLoginSession::cleanup()
 
 void TestLoginSession::loginCountsAndLogoffUncounts()
 {
-    LoginSession session(m_workspace->context());
+    LoginSession session = ContextWiring::loginSession(m_workspace->context());
     QCOMPARE(session.login(u"Bob"_s, u"pw"_s), u"1"_s);
     QCOMPARE(m_workspace->context().loginState().currentUser, u"bob"_s);
     QCOMPARE(m_workspace->context().loginState().currentUserFields, u"1,2"_s);
@@ -64,7 +65,7 @@ void TestLoginSession::loginCountsAndLogoffUncounts()
 
 void TestLoginSession::builtInAccountIsNeverCounted()
 {
-    LoginSession session(m_workspace->context());
+    LoginSession session = ContextWiring::loginSession(m_workspace->context());
     QCOMPARE(session.login(u"sysop"_s, u"sysop"_s), u"0"_s);
     QCOMPARE(m_workspace->context().loginState().currentUserType, 1);
     session.logoff(true);
@@ -73,7 +74,7 @@ void TestLoginSession::builtInAccountIsNeverCounted()
 
 void TestLoginSession::failedLoginClearsTheState()
 {
-    LoginSession session(m_workspace->context());
+    LoginSession session = ContextWiring::loginSession(m_workspace->context());
     QVERIFY(session.login(u"bob"_s, u"pw"_s));
     QCOMPARE(session.login(u"bob"_s, u"wrong"_s), std::nullopt);
     QVERIFY(!m_workspace->context().loginState().loggedIn);
@@ -87,8 +88,8 @@ void TestLoginSession::twoCopiesCountToTwoAndBack()
     other.store().writeSetting(u"DBPath"_s, m_workspace->sharedFolder());
     other.store().writeSetting(u"AccPackage"_s, u"MoneyWorks"_s);
     QVERIFY(other.connect());
-    LoginSession first(m_workspace->context());
-    LoginSession second(other.context());
+    LoginSession first = ContextWiring::loginSession(m_workspace->context());
+    LoginSession second = ContextWiring::loginSession(other.context());
     QCOMPARE(first.login(u"bob"_s, u"pw"_s), u"1"_s);
     QCOMPARE(second.login(u"BOB"_s, u"pw"_s), u"2"_s);
     first.logoff(true);

@@ -1,6 +1,6 @@
 // Veltrix — KPI dashboard for small businesses.
-#include "app/numberformat.h"
-#include "views/gridoperations.h"
+#include "common/numberformat.h"
+#include "grid/gridoperations.h"
 
 #include <QSignalSpy>
 #include <QTest>

@@ -1,8 +1,9 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "testworkspace.h"
 
+#include "app/contextwiring.h"
 #include "engine/usualsign.h"
-#include "views/gridoperations.h"
+#include "grid/gridoperations.h"
 #include "views/kpigrid.h"
 #include "views/tabviewbuilder.h"
 
@@ -39,7 +40,7 @@ private:
     void build(GridModel &grid, int tab)
     {
         TabViewBuilder::addMainColumns(grid);
-        TabViewBuilder(context(), grid).buildTabView(tab, 0);
+        ContextWiring::tabViewBuilder(context(), grid).buildTabView(tab, 0);
     }
 
     std::unique_ptr<TestWorkspace> m_workspace;
@@ -202,7 +203,7 @@ void TestTabViewBuilder::barsAreJudgedOnSignedFigures()
     GridModel grid;
     build(grid, 2);
     QMap<qint64, double> values;
-    for (const auto &bar : TabViewBuilder(context(), grid).graphBars(grid))
+    for (const auto &bar : ContextWiring::tabViewBuilder(context(), grid).graphBars(grid))
         values.insert(bar.fieldId, bar.value);
     QCOMPARE(values.value(16), 58.3);
     QCOMPARE(values.value(28), -5.0);

@@ -1,6 +1,6 @@
 // Veltrix — KPI dashboard for small businesses.
-#include "app/settingsstore.h"
 #include "app/widgetplacement.h"
+#include "common/settingsstore.h"
 
 #include <QTemporaryDir>
 #include <QTest>

@@ -3,10 +3,11 @@
 #include "testworkspace.h"
 
 #include "app/demoworkspace.h"
-#include "app/fileoperations.h"
+#include "app/mainconnector.h"
 #include "app/settingsloader.h"
+#include "common/fileoperations.h"
 #include "database/configvalues.h"
-#include "database/mainconnector.h"
+#include "grid/gridmodel.h"
 #include "main/mainwindow.h"
 #include "report/gridreport.h"
 #include "report/printwindow.h"
@@ -16,7 +17,6 @@
 #include "views/bargraphitem.h"
 #include "views/comparewindow.h"
 #include "views/grapharea.h"
-#include "views/gridmodel.h"
 #include "views/gridview.h"
 #include "views/kpitabview.h"
 

@@ -3,7 +3,7 @@
 #include "testworkspace.h"
 
 #include "app/demoworkspace.h"
-#include "engine/producecommand.h"
+#include "app/producecommand.h"
 #include "main/mainwindow.h"
 #include "report/gifencoder.h"
 #include "report/printwindow.h"

@@ -1,7 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "gridoperations.h"
 
-#include "app/numberformat.h"
+#include "common/numberformat.h"
 #include "database/recordset.h"
 
 #include <QDateTime>

@@ -1,6 +1,8 @@
 // Veltrix — KPI dashboard for small businesses.
 #pragma once
 
+#include "engine/rangeselection.h"
+
 #include <QDate>
 
 class AppContext;
@@ -11,14 +13,7 @@ class AppContext;
 class ProduceCommand
 {
 public:
-    struct Selection
-    {
-        int firstMonth = 1; // 1 to 12
-        int firstYear = 0;
-        int lastMonth = 1;
-        int lastYear = 0;
-    };
-
+    using Selection = RangeSelection::Selection;
     enum class Outcome { Produced, NoSource, InvalidRange, Failed };
 
     explicit ProduceCommand(AppContext &context);

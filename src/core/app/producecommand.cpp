@@ -1,12 +1,13 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "producecommand.h"
 
-#include "rangeloader.h"
+#include "app/contextwiring.h"
+#include "engine/rangeloader.h"
 
-#include "app/appcontext.h"
-#include "app/errorreporter.h"
-#include "app/prompter.h"
-#include "app/settingsstore.h"
+#include "appcontext.h"
+#include "common/errorreporter.h"
+#include "common/prompter.h"
+#include "common/settingsstore.h"
 #include "sources/sourcefactory.h"
 
 using namespace Qt::StringLiterals;
@@ -28,7 +29,7 @@ QDate ProduceCommand::rangeEnd(const Selection &selection)
 
 ProduceCommand::Outcome ProduceCommand::produce(const Selection &selection, Remember remember)
 {
-    const AppContext::BusyScope busy(m_context);
+    const BusyState::Scope busy(m_context.busyState());
     const Settings &settings = m_context.settings();
     if (!m_context.accountingSource())
         m_context.setAccountingSource(
@@ -83,7 +84,7 @@ ProduceCommand::Outcome ProduceCommand::produce(const Selection &selection, Reme
         return Outcome::Failed;
     }
     data.setCurrentSlot(0);
-    RangeLoader(m_context).loadDateRange(start, end);
+    ContextWiring::rangeLoader(m_context).loadDateRange(start, end);
 
     if (remember == Remember::Nothing)
         return Outcome::Produced;

@@ -1,14 +1,14 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "mainconnector.h"
 
-#include "configvalues.h"
-#include "maindatabase.h"
-#include "schemacheck.h"
+#include "database/configvalues.h"
+#include "database/maindatabase.h"
+#include "database/schemacheck.h"
 
-#include "app/appcontext.h"
-#include "app/errorreporter.h"
-#include "app/numberformat.h"
-#include "app/version.h"
+#include "appcontext.h"
+#include "common/errorreporter.h"
+#include "common/numberformat.h"
+#include "common/version.h"
 #include "engine/cachefile.h"
 #include "engine/perioddataset.h"
 #include "sources/accountingsource.h"
