@@ -72,10 +72,12 @@ private:
     KpiTabView *m_view = nullptr;
 };
 
-int writePdf(AppContext &context, const GridModel &grid, const QString &picture, const QString &out)
+int writePdf(AppContext &context, const KpiTabView &view, const QString &picture,
+             const QString &out)
 {
     // The same page set-up the print window applies with its boxes ticked, put back after.
-    const QString title = GridReport::reportTitle(context);
+    const QString title = GridReport::pageTitle(context, view);
+    const GridModel &grid = view.grid();
     PageSetupSession pageSetup(context.settingsStore());
     pageSetup.applyPageOptions(true, true, true, title);
     const PrintOptions options = PrintOptions::fromStore(
@@ -147,7 +149,7 @@ int report(const QStringList &arguments)
         return HeadlessSession::IncompleteFigures;
     const QString picture = GridReport::graphPicture(context, view);
     if (suffix == u"pdf"_s)
-        return writePdf(context, view.grid(), picture, out);
+        return writePdf(context, view, picture, out);
     return writeHtml(context, view.grid(), picture, out);
 }
 

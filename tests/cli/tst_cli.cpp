@@ -371,21 +371,29 @@ void TestCli::reportPrintsEveryBenchmark_data()
 {
     QTest::addColumn<QString>("tab");
     QTest::addColumn<int>("benchmarks"); // percentage rows of the tab
-    QTest::newRow("Summary") << u"1"_s << 7;
-    QTest::newRow("Paint, every benchmark an at-most one") << u"4"_s << 8;
-    QTest::newRow("Financial") << u"6"_s << 8;
+    QTest::addColumn<QString>("title");
+    QTest::newRow("Summary") << u"1"_s << 7 << u"Summary: 1/7/25 to 30/6/26"_s;
+    QTest::newRow("Paint, every benchmark an at-most one")
+        << u"4"_s << 8 << u"Paint: 1/7/25 to 30/6/26"_s;
+    QTest::newRow("all tabs, on three pages") << u"0"_s << 33 << u"All: 1/7/25 to 30/6/26"_s;
 }
 
 void TestCli::reportPrintsEveryBenchmark()
 {
     QFETCH(QString, tab);
     QFETCH(int, benchmarks);
+    QFETCH(QString, title);
     const QString pdf = m_dir.filePath(u"tab%1.pdf"_s.arg(tab));
     const Run run = report({u"--tab"_s, tab, u"--out"_s, pdf});
     QVERIFY2(run.exitCode == 0, qPrintable(run.err));
     const QString text = runTool(u"pdftotext"_s, {u"-layout"_s, pdf, u"-"_s});
     static const QRegularExpression benchmark(u"[<>][0-9.]+%"_s);
     QCOMPARE(text.count(benchmark), benchmarks);
+    // Every page names the tab and the range and repeats the column headings.
+    const int pages = int(text.count(u'\f'));
+    QVERIFY(pages >= 1);
+    QCOMPARE(text.count(title), pages);
+    QCOMPARE(text.count(u"Optimal %"_s), pages);
 }
 
 void TestCli::reportHtmlKeepsItsPicture()

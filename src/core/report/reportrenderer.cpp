@@ -3,6 +3,7 @@
 
 #include <QAbstractTextDocumentLayout>
 #include <QFileInfo>
+#include <QFontMetricsF>
 #include <QLocale>
 #include <QPagedPaintDevice>
 #include <QPainter>
@@ -61,6 +62,52 @@ void clearBackgrounds(QTextDocument &document)
             cursor.setPosition(fragment.position() + fragment.length(), QTextCursor::KeepAnchor);
             cursor.setCharFormat(format);
         }
+    }
+}
+
+// The widest line a cell's text needs, in the document's units, padding included.
+double cellTextWidth(const QTextTable *table, const QTextTableCell &cell)
+{
+    double widest = 0.0;
+    for (QTextBlock block = cell.firstCursorPosition().block();
+         block.isValid() && block.position() <= cell.lastCursorPosition().position();
+         block = block.next()) {
+        double width = 0.0;
+        for (auto it = block.begin(); !it.atEnd(); ++it) {
+            const QTextFragment fragment = it.fragment();
+            width += QFontMetricsF(fragment.charFormat().font()).horizontalAdvance(fragment.text());
+        }
+        widest = std::max(widest, width);
+    }
+    const QTextTableFormat format = table->format();
+    return widest + 2 * format.cellPadding() + 2 * format.border() + 2;
+}
+
+// A browser sizes the columns of an automatic table to their contents and gives what is left
+// to the column whose text is longest; the text engine would share the width out evenly and
+// leave a short column (the row number) as wide as the labels. The header row is repeated at
+// the top of every page, as a printed table's headings are.
+void layOutTables(QTextFrame *frame)
+{
+    for (QTextFrame *child : frame->childFrames()) {
+        if (auto *table = qobject_cast<QTextTable *>(child)) {
+            QList<double> widths(table->columns(), 0.0);
+            for (int r = 0; r < table->rows(); ++r) {
+                for (int c = 0; c < table->columns(); ++c)
+                    widths[c] = std::max(widths[c], cellTextWidth(table, table->cellAt(r, c)));
+            }
+            const auto widest = std::max_element(widths.cbegin(), widths.cend());
+            QList<QTextLength> constraints;
+            for (auto it = widths.cbegin(); it != widths.cend(); ++it) {
+                constraints << (it == widest ? QTextLength(QTextLength::VariableLength, 0)
+                                             : QTextLength(QTextLength::FixedLength, *it));
+            }
+            QTextTableFormat format = table->format();
+            format.setColumnWidthConstraints(constraints);
+            format.setHeaderRowCount(std::min(1, table->rows()));
+            table->setFormat(format);
+        }
+        layOutTables(child);
     }
 }
 
@@ -158,6 +205,7 @@ int ReportRenderer::print(QPagedPaintDevice &device, const PrintOptions &options
     document.setDocumentMargin(0);
     document.setBaseUrl(QUrl::fromLocalFile(m_baseFolder + u'/'));
     document.setHtml(printableHtml(m_html));
+    layOutTables(document.rootFrame());
     if (!options.printBackground)
         clearBackgrounds(document);
 

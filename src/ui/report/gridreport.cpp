@@ -26,6 +26,12 @@ QString reportTitle(AppContext &context)
                                  context.clock().today());
 }
 
+QString pageTitle(AppContext &context, const KpiTabView &view)
+{
+    const QString tab = TabViewBuilder::tabCaptions().value(view.currentTab()).remove(u'&');
+    return tab.isEmpty() ? reportTitle(context) : tab + u": "_s + reportTitle(context);
+}
+
 QString graphPicture(AppContext &context, KpiTabView &view)
 {
     if (view.currentTab() != TabViewBuilder::SummaryTab)
@@ -55,7 +61,7 @@ void showGridReport(AppContext &context, QWidget *owner, const GridModel &grid,
 void printGrid(AppContext &context, QWidget *owner, KpiTabView &view)
 {
     const QString picture = graphPicture(context, view);
-    showGridReport(context, owner, view.grid(), u"id"_s, reportTitle(context), picture);
+    showGridReport(context, owner, view.grid(), u"id"_s, pageTitle(context, view), picture);
 }
 
 } // namespace GridReport

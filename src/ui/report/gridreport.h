@@ -15,6 +15,9 @@ namespace GridReport {
 // "1/7/25 to 30/6/26": the produced range in the region's short date form; a range that ends
 // after today says how far its figures go: "1/7/26 to 30/6/27 (to date: 7 Dec 2026)".
 QString reportTitle(AppContext &context);
+// The title of a printed page: the tab the grid shows, then the range ("Summary: 1/7/25 to
+// 30/6/26"), so that a loose page says what it is.
+QString pageTitle(AppContext &context, const KpiTabView &view);
 // The picture of the view's graph in the temporary bitmap when the view shows its graph (the
 // Summary tab); empty on other tabs or when the picture could not be made (said so).
 QString graphPicture(AppContext &context, KpiTabView &view);

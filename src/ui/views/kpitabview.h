@@ -31,6 +31,7 @@ public:
     int pastCount() const { return m_pastCount; }
 
     GridModel &grid() { return m_grid; }
+    const GridModel &grid() const { return m_grid; }
     GridView *lstGrid() const { return m_gridView; }
     GraphArea *picGraph() const { return m_graph; }
     TooltipPanel *picTooltip() const { return m_tooltip; }

@@ -233,7 +233,7 @@ void TestCompareWindow::printFromTheGraphTab()
         shown = print.ieFrame()->toPlainText();
     });
     window.print();
-    QCOMPARE(header, u"1/7/25 to 30/6/26"_s);
+    QCOMPARE(header, u"Summary: 1/7/25 to 30/6/26"_s);
     QVERIFY(shown.contains(u"Panel labour gross profit %"_s));
 
     const QString page = QString::fromUtf8([&] {
