@@ -4,6 +4,7 @@
 #include "app/loadingwindow.h"
 #include "app/qtprompter.h"
 #include "app/shutdown.h"
+#include "app/widgetplacement.h"
 #include "common/prompter.h"
 #include "common/settingsstore.h"
 #include "main/mainwindow.h"
@@ -31,8 +32,10 @@ int main(int argc, char *argv[])
         mainWindow = std::make_unique<MainWindow>(context, prompter);
         mainWindow->setProgramEnd([&context] { endProgramNow(context); });
         prompter.setParentWindow(mainWindow.get());
+        WidgetPlacement::fitToScreen(*mainWindow);
         mainWindow->show();
     });
+    WidgetPlacement::fitToScreen(*loading);
     loading->show();
     loading->startLoading();
     return QApplication::exec();

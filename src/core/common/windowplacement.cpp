@@ -3,6 +3,8 @@
 
 #include "settingsstore.h"
 
+#include <algorithm>
+
 #include <cmath>
 
 using namespace Qt::StringLiterals;
@@ -54,6 +56,29 @@ QRect WindowPlacement::restore(const QString &windowName, const QRect &current) 
     if (const auto width = readPixels(windowName, u"Width"_s))
         geometry.setWidth(*width);
     return geometry;
+}
+
+bool WindowPlacement::hasSavedPosition(const QString &windowName) const
+{
+    return readPixels(windowName, u"Left"_s).has_value() &&
+           readPixels(windowName, u"Top"_s).has_value();
+}
+
+QRect WindowPlacement::fittedInto(const QRect &wanted, const QRect &area)
+{
+    if (!area.isValid())
+        return wanted;
+    QRect fitted(wanted.topLeft(), wanted.size().boundedTo(area.size()));
+    fitted.moveLeft(std::clamp(fitted.left(), area.left(), area.right() - fitted.width() + 1));
+    fitted.moveTop(std::clamp(fitted.top(), area.top(), area.bottom() - fitted.height() + 1));
+    return fitted;
+}
+
+QRect WindowPlacement::centredOver(const QSize &size, const QRect &over, const QRect &area)
+{
+    QRect centred(QPoint(0, 0), size);
+    centred.moveCenter((over.isValid() ? over : area).center());
+    return fittedInto(centred, area);
 }
 
 std::optional<WindowPlacement::State> WindowPlacement::savedState(const QString &windowName) const

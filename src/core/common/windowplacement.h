@@ -25,6 +25,15 @@ public:
     // leaves that one as it was.
     QRect restore(const QString &windowName, const QRect &current) const;
     std::optional<State> savedState(const QString &windowName) const;
+    // Whether the window's place was ever saved.
+    bool hasSavedPosition(const QString &windowName) const;
+
+    // The window as large as it wants to be but no larger than the area, moved just enough to
+    // lie wholly inside it: a window saved on a larger screen, or at another scaling, never
+    // opens with its title bar or its controls out of reach.
+    static QRect fittedInto(const QRect &wanted, const QRect &area);
+    // A window of that size centred over another (its parent), then fitted into the area.
+    static QRect centredOver(const QSize &size, const QRect &over, const QRect &area);
 
 private:
     std::optional<int> readPixels(const QString &windowName, const QString &item) const;

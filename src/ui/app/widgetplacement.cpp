@@ -17,7 +17,21 @@ WindowPlacement placementFor(const QWidget &window, SettingsStore &store)
     return WindowPlacement(store, WindowPlacement::twipsPerPixelAt(dpi));
 }
 
+QRect availableArea(const QWidget &window)
+{
+    const QScreen *screen = window.screen();
+    return screen ? screen->availableGeometry() : QRect();
+}
+
 } // namespace
+
+void fitToScreen(QWidget &window)
+{
+    const QRect area = availableArea(window);
+    const QRect fitted = WindowPlacement::centredOver(window.size(), QRect(), area);
+    window.move(fitted.topLeft());
+    window.resize(fitted.size());
+}
 
 void saveWindowPlacement(const QWidget &window, SettingsStore &store)
 {
@@ -33,8 +47,14 @@ void saveWindowPlacement(const QWidget &window, SettingsStore &store)
 void restoreWindowPlacement(QWidget &window, SettingsStore &store, bool skipState)
 {
     const WindowPlacement placement = placementFor(window, store);
-    const QRect restored =
-        placement.restore(window.objectName(), QRect(window.pos(), window.size()));
+    const QRect area = availableArea(window);
+    QRect restored = placement.restore(window.objectName(), QRect(window.pos(), window.size()));
+    if (!placement.hasSavedPosition(window.objectName())) {
+        const QWidget *parent = window.parentWidget() ? window.parentWidget()->window() : nullptr;
+        restored = WindowPlacement::centredOver(restored.size(),
+                                                parent ? parent->frameGeometry() : QRect(), area);
+    }
+    restored = WindowPlacement::fittedInto(restored, area);
     window.move(restored.topLeft());
     window.resize(restored.size());
     if (!skipState &&

@@ -18,6 +18,8 @@ private Q_SLOTS:
     void savesNormalWindowInTwips_data();
     void savesNormalWindowInTwips();
     void maximisedAndMinimised();
+    void fitsTheScreen_data();
+    void fitsTheScreen();
     void restoreAppliesOnlyWholeNumbers_data();
     void restoreAppliesOnlyWholeNumbers();
 
@@ -111,6 +113,37 @@ void TestWindowPlacement::restoreAppliesOnlyWholeNumbers()
     m_store->writeSetting(u"frmCompareWidth"_s, width, SettingsStore::FormsKey);
     QCOMPARE(WindowPlacement(*m_store, 15.0).restore(u"frmCompare"_s, QRect(5, 6, 70, 80)),
              expected);
+}
+
+void TestWindowPlacement::fitsTheScreen_data()
+{
+    QTest::addColumn<QRect>("wanted");
+    QTest::addColumn<QRect>("parent"); // invalid: placed before, keep its place
+    QTest::addColumn<QRect>("expected");
+    const QRect area(0, 0, 933, 600); // 1400 x 900 at 150 %, less nothing
+    QTest::newRow("larger than the screen") << QRect(0, 0, 1000, 760) << QRect() << area;
+    QTest::newRow("fits where it is")
+        << QRect(10, 20, 400, 300) << QRect() << QRect(10, 20, 400, 300);
+    QTest::newRow("saved on a wider screen")
+        << QRect(1500, 700, 400, 300) << QRect() << QRect(533, 300, 400, 300);
+    QTest::newRow("above and left of the screen")
+        << QRect(-50, -40, 400, 300) << QRect() << QRect(0, 0, 400, 300);
+    QTest::newRow("new window over its parent")
+        << QRect(0, 0, 400, 300) << QRect(100, 100, 600, 400) << QRect(200, 150, 400, 300);
+    QTest::newRow("parent near the edge")
+        << QRect(0, 0, 400, 300) << QRect(700, 400, 200, 200) << QRect(533, 300, 400, 300);
+}
+
+void TestWindowPlacement::fitsTheScreen()
+{
+    QFETCH(QRect, wanted);
+    QFETCH(QRect, parent);
+    QFETCH(QRect, expected);
+    const QRect area(0, 0, 933, 600);
+    const QRect placed = parent.isValid()
+                             ? WindowPlacement::centredOver(wanted.size(), parent, area)
+                             : WindowPlacement::fittedInto(wanted, area);
+    QCOMPARE(placed, expected);
 }
 
 QTEST_GUILESS_MAIN(TestWindowPlacement)
