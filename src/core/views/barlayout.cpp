@@ -55,45 +55,30 @@ int barWidthTwips(double twipsPerPixelX)
     return int(std::lround((twipsPerPixelX + 1.0) * 54.0));
 }
 
-QList<Placement> placeBars(const QList<qint64> &fieldIds, const QList<int> &heightsPixels,
-                           double twipsPerPixelX, double twipsPerPixelY, bool compare)
+Spread spreadBars(const QList<qint64> &fieldIds, int width)
 {
-    QList<Placement> placements;
-    const int width = barWidthTwips(twipsPerPixelX);
-    for (int n = 0; n < fieldIds.size(); ++n) {
-        Placement place;
-        place.height = int(std::lround(heightsPixels.value(n) * twipsPerPixelY)) - 1;
-        if (n == 0) {
-            place.left = FirstLeft;
-        } else {
-            const bool sameField = compare && fieldIds[n] == fieldIds[n - 1];
-            place.left = placements.last().left + width + (sameField ? 0 : Gap);
-        }
-        place.top = BaseLineY - place.height;
-        placements << place;
-    }
-    return placements;
-}
-
-CompareLayout layoutCompareBars(const QList<qint64> &fieldIds, int periods, int firstLeft,
-                                int innerWidthTwips)
-{
-    CompareLayout layout;
+    Spread spread;
     const int bars = int(fieldIds.size());
-    if (bars == 0 || periods < 1)
-        return layout;
-    const int groups = bars / periods;
-    // A window too narrow for its bars still shows each of them one twip wide.
-    layout.barWidth = std::max(1, (innerWidthTwips - Gap * groups - 20) / bars);
+    if (bars == 0 || width <= 0)
+        return spread;
+    int groups = 1;
+    for (int n = 1; n < bars; ++n)
+        groups += fieldIds[n] != fieldIds[n - 1] ? 1 : 0;
+    // bars * w + (groups + 1) * w / 3 = width; a window too narrow still shows a pixel a bar.
+    const double barWidth = std::max(1.0, 3.0 * width / (3.0 * bars + groups + 1));
+    const double gap = barWidth / 3.0;
+    spread.barWidth = int(std::floor(barWidth));
+    double left = gap;
     for (int n = 0; n < bars; ++n) {
-        if (n == 0) {
-            layout.lefts << firstLeft;
-            continue;
-        }
-        const bool newField = fieldIds[n] != fieldIds[n - 1];
-        layout.lefts << layout.lefts.last() + layout.barWidth + (newField ? Gap : 0);
+        if (n > 0 && fieldIds[n] != fieldIds[n - 1])
+            left += gap;
+        spread.lefts << int(std::lround(left));
+        if (n == 0 || fieldIds[n] != fieldIds[n - 1])
+            spread.groups.append({spread.lefts.last(), 0});
+        left += barWidth;
+        spread.groups.last().second = int(std::lround(left));
     }
-    return layout;
+    return spread;
 }
 
 } // namespace BarLayout

@@ -6,6 +6,8 @@
 #include <QList>
 #include <QString>
 
+#include <utility>
+
 class NumberFormat;
 
 // The shape of one bar of the KPI graph: as tall as the larger of value and optimal, with the
@@ -29,30 +31,19 @@ Bar layoutBar(const QString &optimalString, double actual, double twipsPerPixelY
 // "+2.5%" above the optimal, "-3%" below, "0%" on it.
 QString tooltip(double variant, const NumberFormat &numbers);
 
-// Where the bars of a graph stand, in twips: the first at 35, then each after the one before
-// with a gap of 16; in a comparison the bars of one Field touch.
-struct Placement
-{
-    int left = 0;
-    int top = 0;
-    int height = 0;
-};
-inline constexpr int FirstLeft = 35;
-inline constexpr int Gap = 16;
-inline constexpr int BaseLineY = 3300;
-// The width of a bar stretched over its 54-pixel picture.
+// The width of a bar stretched over its 54-pixel picture, in twips.
 int barWidthTwips(double twipsPerPixelX);
-QList<Placement> placeBars(const QList<qint64> &fieldIds, const QList<int> &heightsPixels,
-                           double twipsPerPixelX, double twipsPerPixelY, bool compare);
 
-// A comparison graph stretched over the width it has: every bar as wide as the others, the
-// bars of one Field touching, a gap between Fields. The first bar keeps its place.
-struct CompareLayout
+// The bars spread over the width they have: the bars of one Field (its periods in a
+// comparison) side by side, a gap of a third of a bar between Fields and at both ends. Every
+// bar is as wide as the others; left edges in pixels from the start of the width.
+struct Spread
 {
     int barWidth = 0;
     QList<int> lefts;
+    // Where each Field's bars begin and end, for its name below them.
+    QList<std::pair<int, int>> groups;
 };
-CompareLayout layoutCompareBars(const QList<qint64> &fieldIds, int periods, int firstLeft,
-                                int innerWidthTwips);
+Spread spreadBars(const QList<qint64> &fieldIds, int width);
 
 } // namespace BarLayout

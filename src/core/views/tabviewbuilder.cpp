@@ -123,7 +123,7 @@ QList<TabViewBuilder::GraphBar> TabViewBuilder::graphBars(const GridModel &grid,
         for (int slot = pastCount; slot >= 0; --slot) {
             data.setCurrentSlot(quint8(slot));
             if (data.current().findFieldPos(id) != 0)
-                bars << GraphBar{id, benchmark, data.getFieldValue(id)};
+                bars << GraphBar{id, benchmark, data.getFieldValue(id), slot};
         }
     }
     data.setCurrentSlot(0);

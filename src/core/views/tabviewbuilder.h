@@ -34,6 +34,7 @@ public:
         qint64 fieldId = 0;
         QString benchmark;
         double value = 0.0;
+        int slot = 0;
     };
 
     // The bars of the graph, from the grid's visible rows with a benchmark, in order; with earlier

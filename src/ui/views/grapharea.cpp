@@ -3,7 +3,9 @@
 
 #include "bargraphitem.h"
 
+#include "common/numberformat.h"
 #include "views/barlayout.h"
+#include "views/kpievaluation.h"
 
 #include <QLabel>
 #include <QPainter>
@@ -39,80 +41,88 @@ int GraphArea::toPixelsY(int twips) const
 
 QSize GraphArea::sizeHint() const
 {
-    return {ScaleMargin + toPixelsX(ScaleWidth), toPixelsY(ScaleLines[0]) + 20};
+    return {ScaleMargin + toPixelsX(ScaleWidth),
+            toPixelsY(ScaleLines[0]) + fontMetrics().height() + 6};
 }
 
-void GraphArea::setBars(const QList<BarSpec> &specs, bool compare, int periods)
+void GraphArea::setBars(const QList<BarSpec> &specs, bool compare, int /*periods*/)
 {
     m_compare = compare;
-    m_periods = std::max(1, periods);
     qDeleteAll(m_bars);
     qDeleteAll(m_labels);
+    qDeleteAll(m_names);
     m_bars.clear();
     m_labels.clear();
+    m_names.clear();
 
-    QList<qint64> ids;
-    QList<int> heights;
-    for (const BarSpec &wanted : specs) {
+    for (qsizetype n = 0; n < specs.size(); ++n) {
+        const BarSpec &wanted = specs[n];
         auto *bar = new BarGraphItem(m_numbers, this);
         bar->setTag(wanted.fieldId);
         bar->setOptimalString(wanted.benchmark);
         bar->setActualValue(wanted.value);
+        bar->setAutoWidth(false);
         connect(bar, &BarGraphItem::focused, this, &GraphArea::barFocused);
-        m_bars << bar;
-        ids << wanted.fieldId;
-        heights << bar->layout().columnHeight;
-    }
-    const QList<BarLayout::Placement> places =
-        BarLayout::placeBars(ids, heights, BarGraphItem::twipsPerPixelX(this),
-                             BarGraphItem::twipsPerPixelY(this), compare);
-    for (int n = 0; n < m_bars.size(); ++n) {
-        BarGraphItem *bar = m_bars[n];
-        bar->move(ScaleMargin + toPixelsX(places[n].left), toPixelsY(places[n].top));
-        const QString tip = BarLayout::tooltip(bar->variantValue(), m_numbers);
-        bar->setToolTip(tip);
+        const QString variant = BarLayout::tooltip(bar->variantValue(), m_numbers);
+        QStringList tip{wanted.label.isEmpty() ? wanted.name : wanted.label};
+        if (!wanted.period.isEmpty())
+            tip << wanted.period;
+        tip << tr("Value: %1%").arg(m_numbers.locale().toString(wanted.value, 'f', 1))
+            << tr("Optimal: %1").arg(KpiEvaluation::benchmarkCellText(wanted.benchmark))
+            << tr("Variant: %1").arg(variant);
+        bar->setToolTip(tip.join(u'\n'));
         bar->show();
-        if (compare)
-            continue;
-        auto *label = new QLabel(tip, this);
-        label->adjustSize();
-        label->move(bar->x(), bar->y() - label->height() - toPixelsY(LabelGap));
-        label->show();
-        m_labels << label;
+        m_bars << bar;
+        if (!compare) {
+            auto *label = new QLabel(variant, this);
+            label->adjustSize();
+            label->show();
+            m_labels << label;
+        }
+        if (n == 0 || specs[n - 1].fieldId != wanted.fieldId) {
+            auto *name = new QLabel(wanted.name, this);
+            name->setAlignment(Qt::AlignHCenter | Qt::AlignTop);
+            name->setToolTip(wanted.label);
+            name->show();
+            m_names << name;
+        }
     }
-    if (compare)
-        layoutCompareBars();
+    layoutBars();
 }
 
-void GraphArea::layoutCompareBars()
+void GraphArea::layoutBars()
 {
     QList<qint64> ids;
     for (const BarGraphItem *bar : std::as_const(m_bars))
         ids << bar->tag();
-    const double tpp = BarGraphItem::twipsPerPixelX(this);
-    const int innerTwips = int(std::lround((width() - ScaleMargin) * tpp));
-    const BarLayout::CompareLayout layout =
-        BarLayout::layoutCompareBars(ids, m_periods, BarLayout::FirstLeft, innerTwips);
+    const int baseLine = toPixelsY(ScaleLines[0]);
+    const BarLayout::Spread spread = BarLayout::spreadBars(ids, width() - ScaleMargin);
     for (int n = 0; n < m_bars.size(); ++n) {
         BarGraphItem *bar = m_bars[n];
-        bar->setAutoWidth(false);
-        const int left = ScaleMargin + toPixelsX(layout.lefts[n]);
-        const int right = ScaleMargin + toPixelsX(layout.lefts[n] + layout.barWidth);
-        bar->setGeometry(left, bar->y(), std::max(1, right - left), bar->height());
+        const int height = bar->layout().columnHeight;
+        bar->setGeometry(ScaleMargin + spread.lefts[n], baseLine - height, spread.barWidth, height);
+        if (n < m_labels.size()) {
+            QLabel *label = m_labels[n];
+            label->move(bar->x() + (bar->width() - label->width()) / 2,
+                        bar->y() - label->height() - toPixelsY(LabelGap));
+        }
+    }
+    for (int g = 0; g < m_names.size() && g < spread.groups.size(); ++g) {
+        const auto [left, right] = spread.groups[g];
+        m_names[g]->setGeometry(ScaleMargin + left, baseLine + 2, right - left,
+                                fontMetrics().height() + 2);
     }
 }
 
 void GraphArea::resizeEvent(QResizeEvent *event)
 {
     QWidget::resizeEvent(event);
-    if (m_compare)
-        layoutCompareBars();
+    layoutBars();
 }
 
 int GraphArea::scaleRight() const
 {
-    // A comparison stretches its scale over the whole width; the main graph keeps its own.
-    return m_compare ? width() : ScaleMargin + toPixelsX(ScaleWidth);
+    return width();
 }
 
 void GraphArea::paintEvent(QPaintEvent *)

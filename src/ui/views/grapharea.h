@@ -8,8 +8,9 @@ class BarGraphItem;
 class NumberFormat;
 class QLabel;
 
-// The bar graph of the Summary tab: a scale from 10 to 100 and one bar per percentage Field,
-// standing on the base line, with its variant written above it.
+// The bar graph of the Summary tab: a scale from 10 to 100 and one bar per percentage Field
+// (per Field and period in a comparison) spread over the whole width, standing on the base
+// line with its variant written above it and the Field's row number below.
 class GraphArea : public QWidget
 {
     Q_OBJECT
@@ -20,6 +21,9 @@ public:
         qint64 fieldId = 0;
         QString benchmark;
         double value = 0.0;
+        QString name;   // below the bars: the Field's row number
+        QString label;  // the Field's label, in the tip
+        QString period; // in a comparison, the period the bar shows
     };
 
     explicit GraphArea(const NumberFormat &numbers, QWidget *parent = nullptr);
@@ -29,6 +33,7 @@ public:
     void setBars(const QList<BarSpec> &bars, bool compare, int periods = 1);
     const QList<BarGraphItem *> &bars() const { return m_bars; }
     const QList<QLabel *> &variantLabels() const { return m_labels; }
+    const QList<QLabel *> &nameLabels() const { return m_names; }
 
     QSize sizeHint() const override;
 
@@ -43,7 +48,7 @@ protected:
     void resizeEvent(QResizeEvent *event) override;
 
 private:
-    void layoutCompareBars();
+    void layoutBars();
     int scaleRight() const;
 
     int toPixelsX(int twips) const;
@@ -52,6 +57,6 @@ private:
     const NumberFormat &m_numbers;
     QList<BarGraphItem *> m_bars;
     QList<QLabel *> m_labels;
+    QList<QLabel *> m_names;
     bool m_compare = false;
-    int m_periods = 1;
 };

@@ -72,11 +72,29 @@ void KpiTabView::showTab(int tab)
     m_gridView->show();
     if (tab == TabViewBuilder::SummaryTab) {
         QList<GraphArea::BarSpec> bars;
-        for (const TabViewBuilder::GraphBar &bar : builder.graphBars(m_grid, m_pastCount))
-            bars << GraphArea::BarSpec{bar.fieldId, bar.benchmark, bar.value};
+        const int rowColumn = m_grid.columnIndex(u"row"_s);
+        const int labelColumn = m_grid.columnIndex(u"label"_s);
+        for (const TabViewBuilder::GraphBar &bar : builder.graphBars(m_grid, m_pastCount)) {
+            const int row = GridOperations::findGridRow(m_grid, 1, QString::number(bar.fieldId));
+            bars << GraphArea::BarSpec{bar.fieldId,
+                                       bar.benchmark,
+                                       bar.value,
+                                       m_grid.cellText(row, rowColumn),
+                                       m_grid.cellText(row, labelColumn),
+                                       m_pastCount > 0 ? periodName(bar.slot) : QString()};
+        }
         m_graph->setBars(bars, m_pastCount > 0, m_pastCount + 1);
     }
     m_graph->setVisible(tab == TabViewBuilder::SummaryTab);
+}
+
+QString KpiTabView::periodName(int slot) const
+{
+    const PeriodDataSet::Range range = m_context.periodDataSet().range(slot);
+    const QLocale &locale = m_context.numberFormat().locale();
+    const QString first = locale.toString(range.start, u"MMM yyyy"_s);
+    const QString last = locale.toString(range.end, u"MMM yyyy"_s);
+    return first == last ? first : first + u" – "_s + last;
 }
 
 void KpiTabView::clear()

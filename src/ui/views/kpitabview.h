@@ -39,6 +39,9 @@ public:
 
     // Opens the explanation of the row's Field under its "Field" cell.
     void explainRow(int row);
+    // The months of a period slot as the comparison's legend and tips name them:
+    // "Jul 2024 – Jun 2025".
+    QString periodName(int slot) const;
 
 private:
     void selectField(qint64 fieldId);

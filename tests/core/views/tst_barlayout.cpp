@@ -2,6 +2,7 @@
 #include "common/numberformat.h"
 #include "views/barlayout.h"
 
+#include <QSet>
 #include <QTest>
 
 using namespace Qt::StringLiterals;
@@ -16,9 +17,8 @@ private Q_SLOTS:
     void denserScreensScaleUp();
     void tooltips_data();
     void tooltips();
-    void placement();
-    void compareLayout_data();
-    void compareLayout();
+    void spread_data();
+    void spread();
 
 private:
     NumberFormat m_numbers{QLocale(QLocale::English, QLocale::Australia)};
@@ -87,50 +87,45 @@ void TestBarLayout::tooltips()
     QCOMPARE(BarLayout::tooltip(variant, m_numbers), text);
 }
 
-void TestBarLayout::placement()
-{
-    QCOMPARE(BarLayout::barWidthTwips(15.0), 864);
-    const auto main = BarLayout::placeBars({1, 2, 3}, {60, 50, 0}, 15.0, 15.0, false);
-    QCOMPARE(main.at(0).left, 35);
-    QCOMPARE(main.at(1).left, 35 + 864 + 16);
-    QCOMPARE(main.at(2).left, 35 + 2 * (864 + 16));
-    QCOMPARE(main.at(0).height, 60 * 15 - 1);
-    QCOMPARE(main.at(0).top, 3300 - (60 * 15 - 1));
-    // In a comparison the periods of one Field touch.
-    const auto compare = BarLayout::placeBars({1, 1, 2}, {10, 20, 30}, 15.0, 15.0, true);
-    QCOMPARE(compare.at(1).left, 35 + 864);
-    QCOMPARE(compare.at(2).left, 35 + 2 * 864 + 16);
-}
-
-void TestBarLayout::compareLayout_data()
+void TestBarLayout::spread_data()
 {
     QTest::addColumn<QList<qint64>>("fields");
-    QTest::addColumn<int>("periods");
-    QTest::addColumn<int>("innerWidth");
     QTest::addColumn<int>("width");
-    QTest::addColumn<QList<int>>("lefts");
-    // Two Fields over two periods: (3000 - 16 * 2 - 20) / 4 = 737.
-    QTest::newRow("pairs") << QList<qint64>{5, 5, 9, 9} << 2 << 3000 << 737
-                           << QList<int>{35, 772, 1525, 2262};
-    // Three periods, one Field: (1000 - 16 - 20) / 3 = 321.33 -> 321.
-    QTest::newRow("one field, N = 2")
-        << QList<qint64>{7, 7, 7} << 3 << 1000 << 321 << QList<int>{35, 356, 677};
-    // A window far too narrow still gives every bar a width.
-    QTest::newRow("narrow") << QList<qint64>{1, 2} << 1 << 10 << 1 << QList<int>{35, 52};
-    QTest::newRow("no bars") << QList<qint64>{} << 2 << 3000 << 0 << QList<int>{};
+    QTest::newRow("seven Fields") << QList<qint64>{1, 2, 3, 4, 5, 6, 7} << 700;
+    QTest::newRow("three Fields over four periods")
+        << QList<qint64>{1, 1, 1, 1, 2, 2, 2, 2, 3, 3, 3, 3} << 1200;
+    QTest::newRow("seven Fields over five periods") << [] {
+        QList<qint64> ids;
+        for (qint64 id = 1; id <= 7; ++id)
+            ids << id << id << id << id << id;
+        return ids;
+    }() << 1366;
+    QTest::newRow("far too narrow") << QList<qint64>{1, 2} << 3;
+    QTest::newRow("no bars") << QList<qint64>{} << 500;
 }
 
-void TestBarLayout::compareLayout()
+void TestBarLayout::spread()
 {
     QFETCH(QList<qint64>, fields);
-    QFETCH(int, periods);
-    QFETCH(int, innerWidth);
     QFETCH(int, width);
-    QFETCH(QList<int>, lefts);
-    const BarLayout::CompareLayout layout =
-        BarLayout::layoutCompareBars(fields, periods, BarLayout::FirstLeft, innerWidth);
-    QCOMPARE(layout.barWidth, width);
-    QCOMPARE(layout.lefts, lefts);
+    const BarLayout::Spread spread = BarLayout::spreadBars(fields, width);
+    QCOMPARE(spread.lefts.size(), fields.size());
+    if (fields.isEmpty())
+        return;
+    QVERIFY(spread.barWidth >= 1);
+    for (qsizetype n = 1; n < fields.size(); ++n) {
+        const int gap = spread.lefts[n] - spread.lefts[n - 1] - spread.barWidth;
+        if (fields[n] == fields[n - 1])
+            QVERIFY2(gap >= 0 && gap <= 1, "the periods of one Field touch");
+        else
+            QVERIFY2(gap >= spread.barWidth / 4, "Fields stand apart");
+    }
+    const int used = spread.lefts.last() + spread.barWidth - spread.lefts.first();
+    if (width >= 100) {
+        QVERIFY(spread.lefts.last() + spread.barWidth <= width);
+        QVERIFY2(used >= width * 8 / 10, "the bars use the width they have");
+    }
+    QCOMPARE(spread.groups.size(), QSet<qint64>(fields.cbegin(), fields.cend()).size());
 }
 
 QTEST_GUILESS_MAIN(TestBarLayout)

@@ -170,14 +170,15 @@ void TestCompareWindow::graphBarsTouchPerFieldAndStretch()
     const auto checkLayout = [&] {
         for (int n = 1; n < bars.size(); ++n) {
             const int previousRight = bars[n - 1]->x() + bars[n - 1]->width();
+            const int gap = bars[n]->x() - previousRight;
             if (bars[n]->tag() == bars[n - 1]->tag())
-                QCOMPARE(bars[n]->x(), previousRight);
+                QVERIFY(gap >= 0 && gap <= 1);
             else
-                QCOMPARE(bars[n]->x(), previousRight + 1); // 16 twips
+                QVERIFY(gap >= bars[n]->width() / 4);
         }
         const int right = bars.last()->x() + bars.last()->width();
         QVERIFY(right <= graph->width());
-        QVERIFY(right >= graph->width() - 3 - bars.size());
+        QVERIFY(right - bars.first()->x() >= (graph->width() - GraphArea::ScaleMargin) * 8 / 10);
     };
     checkLayout();
     const int narrow = bars.first()->width();
