@@ -17,6 +17,7 @@ class TabViewBuilder
 public:
     static constexpr int TabCount = 7; // "All" and the six tabs of the Fields table
     static constexpr int SummaryTab = 1;
+    static constexpr int FinancialTab = 6;
 
     TabViewBuilder(PeriodDataSet &data, MainDatabase &database, Prompter &prompter,
                    const NumberFormat &numbers, const LoginState &login, GridModel &grid);

@@ -8,6 +8,7 @@
 
 #include <QHeaderView>
 #include <QKeyEvent>
+#include <QScopedValueRollback>
 
 GridView::GridView(GridModel &grid, QWidget *parent)
     : QTableView(parent)
@@ -32,6 +33,11 @@ GridView::GridView(GridModel &grid, QWidget *parent)
         m_gridAlive = false;
         setModel(nullptr);
     });
+    connect(horizontalHeader(), &QHeaderView::sectionResized, this,
+            [this](int section, int, int width) {
+                if (!m_layingOut && section + 1 != m_fittedColumn)
+                    m_userWidths.insert(section + 1, width);
+            });
     connect(horizontalHeader(), &QHeaderView::sectionClicked, this,
             [this](int section) { Q_EMIT headerClicked(section + 1); });
     connect(this, &QTableView::clicked, this, [this](const QModelIndex &index) {
@@ -99,6 +105,7 @@ void GridView::fitColumn()
 {
     if (!m_gridAlive || m_fittedColumn < 1 || m_fittedColumn > m_grid.columnCount())
         return;
+    const QScopedValueRollback layingOut(m_layingOut, true);
     // The viewport already leaves out the scroll bar and the frame; columns widened beyond
     // the grid's widths for their contents take their extra from the fitted column.
     int widened = 0;
@@ -120,6 +127,7 @@ void GridView::applyLayout()
 {
     if (!m_gridAlive)
         return;
+    const QScopedValueRollback layingOut(m_layingOut, true);
     for (int c = 1; c <= m_grid.columnCount(); ++c) {
         const GridModel::Column &column = m_grid.column(c);
         const bool hidden = !column.visible || column.width == 0;
@@ -127,7 +135,8 @@ void GridView::applyLayout()
         // No value is ever cut short: a column is at least as wide as its widest cell and its
         // header, whatever width the grid gives it.
         const bool fitsContents = !hidden && c != m_fittedColumn;
-        setColumnWidth(c - 1, fitsContents ? std::max({column.width, sizeHintForColumn(c - 1),
+        setColumnWidth(c - 1, fitsContents ? std::max({m_userWidths.value(c, column.width),
+                                                       sizeHintForColumn(c - 1),
                                                        horizontalHeader()->sectionSizeHint(c - 1)})
                                            : column.width);
     }

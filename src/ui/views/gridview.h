@@ -1,6 +1,7 @@
 // Veltrix — KPI dashboard for small businesses.
 #pragma once
 
+#include <QHash>
 #include <QTableView>
 
 class GridModel;
@@ -43,6 +44,10 @@ private:
     GridTableModel *m_model;
     bool m_cellEditing = false;
     bool m_gridAlive = true;
+    // Widths the user dragged a column to, by column: they hold when the grid is filled again
+    // (another tab), never narrower than the column's contents.
+    QHash<int, int> m_userWidths;
+    bool m_layingOut = false;
     int m_fittedColumn = 0;
 
     void fitColumn();

@@ -37,6 +37,8 @@ KpiTabView::KpiTabView(AppContext &context, QWidget *parent, int pastCount)
         TabViewBuilder::addCompareColumns(m_grid);
     else
         TabViewBuilder::addMainColumns(m_grid);
+    // The figures take the width they need; the labels take the rest of the window.
+    m_gridView->setFittedColumn(m_grid.columnIndex(u"label"_s));
 
     auto *layout = new QVBoxLayout(this);
     layout->addWidget(m_caption);

@@ -14,6 +14,7 @@
 #include "views/tabviewbuilder.h"
 #include "views/tooltippanel.h"
 
+#include <QHeaderView>
 #include <QLabel>
 #include <QSignalSpy>
 #include <QTemporaryDir>
@@ -202,6 +203,28 @@ void TestKpiWidgets::summaryScreenshot()
     QVERIFY(window.picTooltip()->isVisible());
     QCOMPARE(window.picTooltip()->lblTooltipTitle()->text(), u"Panel labour gross profit %"_s);
     QVERIFY(window.picTooltip()->lblTooltipMessage()->text().startsWith(u"Panel labour sales"_s));
+
+    // No figure is cut short, the labels take the width left, and a column the user widened
+    // stays so on another tab.
+    GridView *view = window.lstGrid();
+    const int value = window.grid().columnIndex(u"value"_s);
+    for (const int tab : {TabViewBuilder::FinancialTab, TabViewBuilder::SummaryTab}) {
+        window.showTab(tab);
+        for (int row = 1; row <= window.grid().rowCount(); ++row) {
+            const QString text = window.grid().cellText(row, value);
+            QVERIFY2(view->fontMetrics().horizontalAdvance(text) + 6 <=
+                         view->columnWidth(value - 1),
+                     qPrintable(text));
+        }
+    }
+    int used = 0;
+    for (int c = 0; c < view->model()->columnCount(); ++c)
+        used += view->isColumnHidden(c) ? 0 : view->columnWidth(c);
+    QVERIFY(used >= view->viewport()->width() - 2);
+    view->horizontalHeader()->resizeSection(value - 1, 180);
+    window.showTab(TabViewBuilder::FinancialTab);
+    QCOMPARE(view->columnWidth(value - 1), 180);
+    window.showTab(TabViewBuilder::SummaryTab);
 
     const QImage shot = window.grab().toImage();
     QVERIFY(!shot.isNull());
