@@ -35,16 +35,11 @@
 #include <QCheckBox>
 #include <QCloseEvent>
 #include <QComboBox>
-#include <QCompleter>
 #include <QCoreApplication>
-#include <QFocusEvent>
-#include <QFormLayout>
 #include <QGridLayout>
 #include <QHBoxLayout>
-#include <QKeyEvent>
 #include <QKeySequence>
 #include <QLabel>
-#include <QLineEdit>
 #include <QMenuBar>
 #include <QPushButton>
 #include <QStackedWidget>
@@ -88,7 +83,7 @@ MainWindow::MainWindow(AppContext &context, Prompter &prompter, QWidget *parent)
 
     updateLoginState();
     restoreSelection();
-    loadUserList(true);
+    m_picLogin->loadUserList(true);
     updateClock();
     m_tmrUsers->start();
     m_tmrDT->start();
@@ -142,45 +137,9 @@ void MainWindow::buildMenus()
 QWidget *MainWindow::buildLoginPanel()
 {
     auto *page = new QWidget(this);
-    m_picLogin = new QWidget(page);
-    m_picLogin->setObjectName(u"picLogin"_s);
-    m_lstUsers = new QComboBox(m_picLogin);
-    m_lstUsers->setObjectName(u"lstUsers"_s);
-    m_lstUsers->setEditable(true);
-    m_lstUsers->setInsertPolicy(QComboBox::NoInsert);
-    // Typing completes to the first name that begins so, with the completed part selected so
-    // that typing on replaces it; deleting (Backspace, Delete) never completes again.
-    m_lstUsers->setCompleter(nullptr);
-    m_lstUsers->lineEdit()->installEventFilter(this);
-    connect(m_lstUsers->lineEdit(), &QLineEdit::textEdited, this, [this](const QString &typed) {
-        if (m_deletingUserName || typed.isEmpty())
-            return;
-        for (int i = 0; i < m_lstUsers->count(); ++i) {
-            const QString name = m_lstUsers->itemText(i);
-            if (!name.isEmpty() && name.startsWith(typed, Qt::CaseInsensitive)) {
-                QLineEdit *box = m_lstUsers->lineEdit();
-                box->setText(name);
-                box->setSelection(int(typed.size()), int(name.size() - typed.size()));
-                return;
-            }
-        }
-    });
-    m_txtPassword = new QLineEdit(m_picLogin);
-    m_txtPassword->setObjectName(u"txtPassword"_s);
-    m_txtPassword->setEchoMode(QLineEdit::Password);
-    m_txtPassword->installEventFilter(this);
-    auto *butLogin = new QPushButton(u"&Login"_s, m_picLogin);
-    connect(butLogin, &QPushButton::clicked, this,
-            [this] { login(m_lstUsers->currentText(), m_txtPassword->text()); });
-    connect(m_txtPassword, &QLineEdit::returnPressed, this,
-            [this] { login(m_lstUsers->currentText(), m_txtPassword->text()); });
-
-    auto *form = new QFormLayout(m_picLogin);
-    form->addRow(u"Username"_s, m_lstUsers);
-    form->addRow(u"Password"_s, m_txtPassword);
-    form->addRow(QString(), butLogin);
-    m_picLogin->setFixedWidth(320);
-
+    m_picLogin =
+        new LoginPanel(m_context.mainDatabase(), m_context.settingsStore(), m_prompter, page);
+    connect(m_picLogin, &LoginPanel::loginRequested, this, &MainWindow::login);
     auto *centre = new QGridLayout(page);
     centre->addWidget(m_picLogin, 0, 0, Qt::AlignCenter);
     return page;
@@ -189,40 +148,9 @@ QWidget *MainWindow::buildLoginPanel()
 QWidget *MainWindow::buildKpiPanel()
 {
     m_kpiPanel = new QWidget(this);
-    const QLocale &locale = m_context.numberFormat().locale();
-    const auto monthList = [&](const QString &name) {
-        auto *list = new QComboBox(m_kpiPanel);
-        list->setObjectName(name);
-        for (int month = 1; month <= 12; ++month)
-            list->addItem(locale.standaloneMonthName(month));
-        return list;
-    };
-    const auto yearBox = [&](const QString &name) {
-        auto *box = new QComboBox(m_kpiPanel);
-        box->setObjectName(name);
-        box->setEditable(true);
-        // A typed year is a choice, not a new entry of the list.
-        box->setInsertPolicy(QComboBox::NoInsert);
-        const int currentYear = m_context.settings().currentYear;
-        for (int year = currentYear; year >= currentYear - 20; --year)
-            box->addItem(QString::number(year));
-        box->installEventFilter(this);
-        connect(box->lineEdit(), &QLineEdit::textEdited, this,
-                [this, box] { m_typedYears.insert(box); });
-        return box;
-    };
-    m_lstMonth1 = monthList(u"lstMonth1"_s);
-    m_lstYear1 = yearBox(u"lstYear1"_s);
-    m_lstMonth2 = monthList(u"lstMonth2"_s);
-    m_lstYear2 = yearBox(u"lstYear2"_s);
-
-    const auto stepButton = [&](const QString &text, const QString &tip, auto step) {
-        auto *button = new QPushButton(text, m_kpiPanel);
-        button->setToolTip(tip);
-        button->setFixedWidth(32);
-        connect(button, &QPushButton::clicked, this, step);
-        return button;
-    };
+    m_dateRange = new DateRangeChooser(m_context.numberFormat().locale(),
+                                       m_context.settings().currentYear, m_prompter, m_kpiPanel);
+    connect(m_dateRange, &DateRangeChooser::stepped, this, &MainWindow::produce);
     auto *butProduce = new QPushButton(u"&Produce KPI"_s, m_kpiPanel);
     butProduce->setObjectName(u"butProduce"_s);
     butProduce->setToolTip(u"Produce the KPIs of the chosen months (%1 or %2)"_s.arg(
@@ -251,16 +179,7 @@ QWidget *MainWindow::buildKpiPanel()
     m_lstCompareType->setItemText(1, u"Period"_s);
 
     auto *dates = new QHBoxLayout;
-    dates->addWidget(new QLabel(u"From date"_s, m_kpiPanel));
-    dates->addWidget(m_lstMonth1);
-    dates->addWidget(m_lstYear1);
-    dates->addWidget(new QLabel(u"To date"_s, m_kpiPanel));
-    dates->addWidget(m_lstMonth2);
-    dates->addWidget(m_lstYear2);
-    dates->addWidget(stepButton(u"«"_s, u"Previous Year"_s, &MainWindow::stepPreviousYear));
-    dates->addWidget(stepButton(u"‹"_s, u"Previous Month"_s, &MainWindow::stepPreviousMonth));
-    dates->addWidget(stepButton(u"›"_s, u"Following Month"_s, &MainWindow::stepFollowingMonth));
-    dates->addWidget(stepButton(u"»"_s, u"Following Year"_s, &MainWindow::stepFollowingYear));
+    dates->addWidget(m_dateRange);
     dates->addWidget(butProduce);
     dates->addStretch();
     dates->addWidget(m_chkCompare);
@@ -311,30 +230,7 @@ void MainWindow::restoreSelection()
         ErrorReporter(m_prompter).reportError(380, u"Invalid property value"_s, u"Form Load"_s);
         return;
     }
-    m_lstMonth1->setCurrentIndex(remembered->firstMonth - 1);
-    m_lstMonth2->setCurrentIndex(remembered->lastMonth - 1);
-    m_lstYear1->setEditText(remembered->firstYear);
-    m_lstYear2->setEditText(remembered->lastYear);
-    m_typedYears.clear();
-}
-
-void MainWindow::loadUserList(bool withMessage)
-{
-    RecordOperations::ListContent names;
-    RecordOperations(m_context.mainDatabase(), m_prompter)
-        .loadList(names, u"Users"_s, u"Username"_s, QString(), false);
-    m_lstUsers->clear();
-    m_lstUsers->addItems(names.items);
-    if (!names.items.isEmpty()) {
-        m_lstUsers->setEditText(m_context.settingsStore().readSetting(u"LastUser"_s));
-        return;
-    }
-    m_lstUsers->setEditText(LoginService::BuiltInUser);
-    if (withMessage) {
-        m_prompter.message(u"There are no users added to the database. Please contact the "
-                           u"Administrator"_s,
-                           u"No Users"_s, Prompter::Icon::Information);
-    }
+    m_dateRange->showRemembered(*remembered);
 }
 
 void MainWindow::updateLoginState()
@@ -377,13 +273,10 @@ bool MainWindow::logoff(bool reset)
     closeSessionWindows();
     m_tabView->clear();
     updateLoginState();
-    m_lstUsers->clearEditText();
-    m_txtPassword->clear();
     m_lblLoggedIn->clear();
     m_lblActiveUsers->clear();
     m_lblToDate->clear();
-    loadUserList(false);
-    m_lstUsers->setFocus();
+    m_picLogin->reset();
     return true;
 }
 
@@ -406,23 +299,12 @@ void MainWindow::selectTab(int tab)
     m_tabView->showTab(tab);
 }
 
-void MainWindow::showSelection(int firstMonth, int firstYear, int lastMonth, int lastYear)
-{
-    m_lstMonth1->setCurrentIndex(firstMonth - 1);
-    m_lstYear1->setEditText(QString::number(firstYear));
-    m_lstMonth2->setCurrentIndex(lastMonth - 1);
-    m_lstYear2->setEditText(QString::number(lastYear));
-    m_typedYears.clear();
-}
-
 void MainWindow::produce()
 {
-    if (!checkYears())
+    if (!m_dateRange->checkYears())
         return;
-    const ProduceCommand::Selection selection{
-        m_lstMonth1->currentIndex() + 1, m_lstYear1->currentText().toInt(),
-        m_lstMonth2->currentIndex() + 1, m_lstYear2->currentText().toInt()};
-    if (ProduceCommand(m_context).produce(selection) != ProduceCommand::Outcome::Produced)
+    if (ProduceCommand(m_context).produce(m_dateRange->selection()) !=
+        ProduceCommand::Outcome::Produced)
         return;
     selectTab(m_currentTab);
     updateToDateNote();
@@ -442,89 +324,29 @@ void MainWindow::updateToDateNote()
                                      : QString());
 }
 
-bool MainWindow::checkYears()
-{
-    for (QComboBox *box : {m_lstYear1, m_lstYear2}) {
-        if (isRefusable(box)) {
-            refuseYear(box);
-            return false;
-        }
-    }
-    return true;
-}
-
-bool MainWindow::isRefusable(const QComboBox *box) const
-{
-    return m_typedYears.contains(box) &&
-           !RangeSelection::isValidYear(box->currentText(), m_context.settings().currentYear);
-}
-
-void MainWindow::refuseYear(QComboBox *box)
-{
-    m_refusedYears.insert(box, box->currentText());
-    m_prompter.message(RangeSelection::invalidYearMessage(m_context.settings().currentYear),
-                       RangeSelection::InvalidYearTitle, Prompter::Icon::Exclamation);
-    box->setFocus(Qt::OtherFocusReason);
-    box->lineEdit()->selectAll();
-}
-
 void MainWindow::print()
 {
     GridReport::printGrid(m_context, this, *m_tabView);
 }
 
-namespace {
-
-ProduceCommand::Selection selectionOf(const QComboBox *month1, const QComboBox *year1,
-                                      const QComboBox *month2, const QComboBox *year2)
-{
-    return {month1->currentIndex() + 1, year1->currentText().toInt(), month2->currentIndex() + 1,
-            year2->currentText().toInt()};
-}
-
-} // namespace
-
-void MainWindow::step(
-    const std::function<std::optional<ProduceCommand::Selection>(const ProduceCommand::Selection &)>
-        &next)
-{
-    if (!checkYears())
-        return;
-    const std::optional<ProduceCommand::Selection> stepped =
-        next(selectionOf(m_lstMonth1, m_lstYear1, m_lstMonth2, m_lstYear2));
-    if (!stepped) {
-        m_prompter.message(RangeSelection::LimitMessage, RangeSelection::LimitTitle,
-                           Prompter::Icon::Exclamation);
-        return;
-    }
-    showSelection(stepped->firstMonth, stepped->firstYear, stepped->lastMonth, stepped->lastYear);
-    produce();
-}
-
 void MainWindow::stepPreviousMonth()
 {
-    step(RangeSelection::previousMonth);
+    m_dateRange->stepPreviousMonth();
 }
 
 void MainWindow::stepFollowingMonth()
 {
-    const int currentYear = m_context.settings().currentYear;
-    step([currentYear](const auto &selection) {
-        return RangeSelection::followingMonth(selection, currentYear);
-    });
+    m_dateRange->stepFollowingMonth();
 }
 
 void MainWindow::stepPreviousYear()
 {
-    step(RangeSelection::previousYear);
+    m_dateRange->stepPreviousYear();
 }
 
 void MainWindow::stepFollowingYear()
 {
-    const int currentYear = m_context.settings().currentYear;
-    step([currentYear](const auto &selection) {
-        return RangeSelection::followingYear(selection, currentYear);
-    });
+    m_dateRange->stepFollowingYear();
 }
 
 void MainWindow::pollUsers()
@@ -591,35 +413,6 @@ void MainWindow::updateClock()
     const QString text = clockText(m_context.clock().now());
     if (m_lblDT->text() != text)
         m_lblDT->setText(text);
-}
-
-bool MainWindow::eventFilter(QObject *watched, QEvent *event)
-{
-    if (watched == m_lstUsers->lineEdit() && event->type() == QEvent::KeyPress) {
-        const int key = static_cast<QKeyEvent *>(event)->key();
-        m_deletingUserName = key == Qt::Key_Backspace || key == Qt::Key_Delete;
-    }
-    if (watched == m_txtPassword && event->type() == QEvent::FocusIn) {
-        // Keyboard focus selects the password for retyping; a click places the caret.
-        if (static_cast<QFocusEvent *>(event)->reason() != Qt::MouseFocusReason)
-            QTimer::singleShot(0, m_txtPassword, &QLineEdit::selectAll);
-    }
-    if (event->type() == QEvent::FocusOut && (watched == m_lstYear1 || watched == m_lstYear2)) {
-        // Only the user moving on inside the window leaves the box: another application, a
-        // menu or a message taking the focus does not, and every command checks the years.
-        const Qt::FocusReason reason = static_cast<QFocusEvent *>(event)->reason();
-        if (reason == Qt::TabFocusReason || reason == Qt::BacktabFocusReason ||
-            reason == Qt::MouseFocusReason) {
-            auto *box = static_cast<QComboBox *>(watched);
-            // Looked at once the click or key has done its work, so that a command it ran and
-            // refused the year for is not followed by the same message again.
-            QTimer::singleShot(0, box, [this, box] {
-                if (isRefusable(box) && m_refusedYears.value(box) != box->currentText())
-                    refuseYear(box);
-            });
-        }
-    }
-    return QMainWindow::eventFilter(watched, event);
 }
 
 void MainWindow::closeEvent(QCloseEvent *event)

@@ -1,15 +1,13 @@
 // Veltrix — KPI dashboard for small businesses.
 #pragma once
 
-#include "app/producecommand.h"
+#include "daterangechooser.h"
+#include "loginpanel.h"
 #include "users/userpoll.h"
 
-#include <QHash>
 #include <QMainWindow>
-#include <QSet>
 
 #include <functional>
-#include <optional>
 
 class AppContext;
 class KpiTabView;
@@ -25,7 +23,8 @@ class QTimer;
 class TabButtons;
 
 // frmMain: the login panel, then the KPI views with the choice of months, the Produce
-// command, the tabs, the graph and the grid, with the menus and a status bar.
+// command, the tabs, the graph and the grid, with the menus and a status bar. It composes
+// the panels and carries out what they ask for.
 class MainWindow : public QMainWindow
 {
     Q_OBJECT
@@ -50,14 +49,14 @@ public:
     void selectTab(int tab);
 
     // The controls, by the names the rest of the program knows them.
-    QComboBox *lstUsers() const { return m_lstUsers; }
-    QLineEdit *txtPassword() const { return m_txtPassword; }
+    QComboBox *lstUsers() const { return m_picLogin->lstUsers(); }
+    QLineEdit *txtPassword() const { return m_picLogin->txtPassword(); }
     QWidget *picLogin() const { return m_picLogin; }
     QWidget *kpiPanel() const { return m_kpiPanel; }
-    QComboBox *lstMonth1() const { return m_lstMonth1; }
-    QComboBox *lstMonth2() const { return m_lstMonth2; }
-    QComboBox *lstYear1() const { return m_lstYear1; }
-    QComboBox *lstYear2() const { return m_lstYear2; }
+    QComboBox *lstMonth1() const { return m_dateRange->lstMonth1(); }
+    QComboBox *lstMonth2() const { return m_dateRange->lstMonth2(); }
+    QComboBox *lstYear1() const { return m_dateRange->lstYear1(); }
+    QComboBox *lstYear2() const { return m_dateRange->lstYear2(); }
     QCheckBox *chkCompare() const { return m_chkCompare; }
     QComboBox *lstCompareCount() const { return m_lstCompareCount; }
     QComboBox *lstCompareType() const { return m_lstCompareType; }
@@ -78,25 +77,16 @@ public:
 
 protected:
     void closeEvent(QCloseEvent *event) override;
-    bool eventFilter(QObject *watched, QEvent *event) override;
 
 private:
     void buildMenus();
     QWidget *buildLoginPanel();
     QWidget *buildKpiPanel();
     void restoreSelection();
-    void loadUserList(bool withMessage);
     void updateLoginState();
-    void showSelection(int firstMonth, int firstYear, int lastMonth, int lastYear);
-    void step(const std::function<
-              std::optional<ProduceCommand::Selection>(const ProduceCommand::Selection &)> &next);
     void updateClock();
     void tellLater(const QString &text);
     void updateToDateNote();
-    // Typed years are checked before a command uses them; false after saying which is wrong.
-    bool checkYears();
-    bool isRefusable(const QComboBox *box) const;
-    void refuseYear(QComboBox *box);
     // The comparison and print windows show the session's lines; they close with it.
     void closeSessionWindows();
 
@@ -104,23 +94,11 @@ private:
     Prompter &m_prompter;
     UserPoll m_poll;
     int m_currentTab = 0;
-    bool m_deletingUserName = false;
-    // The year boxes whose text the user typed. Only typed years are checked: the year
-    // buttons may choose the year after the current one as the end of a financial year.
-    QSet<const QComboBox *> m_typedYears;
-    // The invalid text each year box was last refused for, so that leaving it again is not
-    // refused again: the user is told once and never held in the box.
-    QHash<const QComboBox *, QString> m_refusedYears;
 
     QStackedWidget *m_pages = nullptr;
-    QWidget *m_picLogin = nullptr;
+    LoginPanel *m_picLogin = nullptr;
     QWidget *m_kpiPanel = nullptr;
-    QComboBox *m_lstUsers = nullptr;
-    QLineEdit *m_txtPassword = nullptr;
-    QComboBox *m_lstMonth1 = nullptr;
-    QComboBox *m_lstMonth2 = nullptr;
-    QComboBox *m_lstYear1 = nullptr;
-    QComboBox *m_lstYear2 = nullptr;
+    DateRangeChooser *m_dateRange = nullptr;
     QCheckBox *m_chkCompare = nullptr;
     QComboBox *m_lstCompareCount = nullptr;
     QComboBox *m_lstCompareType = nullptr;
