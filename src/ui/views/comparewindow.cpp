@@ -13,6 +13,7 @@
 #include "common/settingsstore.h"
 #include "engine/rangeloader.h"
 #include "report/gridreport.h"
+#include "views/kpigrid.h"
 #include "views/tabviewbuilder.h"
 
 #include <QApplication>
@@ -45,6 +46,7 @@ CompareWindow::CompareWindow(AppContext &context, ComparisonRanges::Kind kind, i
     , m_tabButtons(new TabButtons(this))
     , m_picLoad(new QWidget(this))
     , m_lblLoad(new QLabel(m_picLoad))
+    , m_lblLegend(new QLabel(this))
     , m_picProgress(new QWidget(m_picLoad))
     , m_shpProgress(new QWidget(m_picProgress))
 {
@@ -61,13 +63,18 @@ CompareWindow::CompareWindow(AppContext &context, ComparisonRanges::Kind kind, i
     auto *layout = new QVBoxLayout(this);
     layout->setMenuBar(menu);
     layout->addWidget(m_tabButtons);
+    m_lblLegend->setObjectName(u"lblLegend"_s);
+    m_lblLegend->setWordWrap(true);
+    layout->addWidget(m_lblLegend);
     layout->addWidget(m_tabView, 1);
 
     m_picLoad->setObjectName(u"picLoad"_s);
     m_picLoad->setAutoFillBackground(true);
     m_lblLoad->setObjectName(u"lblLoad"_s);
     m_lblLoad->setAlignment(Qt::AlignCenter);
-    const QString kindText = m_kind == ComparisonRanges::Kind::Years ? u"Years"_s : u"Periods"_s;
+    const bool years = m_kind == ComparisonRanges::Kind::Years;
+    const QString kindText =
+        m_count == 1 ? (years ? u"Year"_s : u"Period"_s) : (years ? u"Years"_s : u"Periods"_s);
     m_lblLoad->setText(u"Please wait while we load the past '"_s + QString::number(m_count) +
                        u" "_s + kindText + u"' of data..."_s);
     m_picProgress->setObjectName(u"picProgress"_s);
@@ -135,6 +142,14 @@ void CompareWindow::loadPeriods()
             return;
     }
     data.setCurrentSlot(0);
+    QStringList periods;
+    for (int slot = int(ranges.size()); slot >= 0; --slot)
+        periods << m_tabView->periodName(slot);
+    m_lblLegend->setText(
+        u"Bars of each line, left to right: %1.&nbsp;&nbsp;&nbsp;<span style='background:%2'>"
+        u"&nbsp;&nbsp;&nbsp;&nbsp;</span> the best period of a line: the highest figure, or the "
+        u"lowest for costs and for shares that should stay under their benchmark."_s.arg(
+            periods.join(u" · "_s).toHtmlEscaped(), KpiGrid::Highest.name()));
     selectTab(m_currentTab);
     m_picLoad->hide();
     m_loading = false;

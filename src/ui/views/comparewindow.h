@@ -39,6 +39,8 @@ public:
     KpiTabView *tabView() const { return m_tabView; }
     QWidget *picLoad() const { return m_picLoad; }
     QLabel *lblLoad() const { return m_lblLoad; }
+    // What the graph's bars and the highlighted cells stand for.
+    QLabel *lblLegend() const { return m_lblLegend; }
     QWidget *shpProgress() const { return m_shpProgress; }
     QPushButton *tabButton(int tab) const;
 
@@ -70,6 +72,7 @@ private:
     TabButtons *m_tabButtons;
     QWidget *m_picLoad;
     QLabel *m_lblLoad;
+    QLabel *m_lblLegend;
     QWidget *m_picProgress;
     QWidget *m_shpProgress;
 };

@@ -105,11 +105,15 @@ void TestCompareWindow::loadsEarlierPeriodsIntoColumns()
 
     CompareWindow window(m_workspace->context(), *ComparisonRanges::kindFromText(kind), count);
     QCOMPARE(window.lblLoad()->text(),
-             u"Please wait while we load the past '%1 %2' of data..."_s.arg(count).arg(kind));
+             u"Please wait while we load the past '%1 %2' of data..."_s.arg(count).arg(
+                 count == 1 ? kind.chopped(1) : kind));
     window.show();
     QVERIFY(window.picLoad()->isVisible());
     QCOMPARE(window.shpProgress()->width(), 0);
     QVERIFY(waitUntilLoaded(window));
+    // The legend names every period, oldest first, and explains the highlight.
+    QCOMPARE(window.lblLegend()->text().count(u" · "_s), count);
+    QVERIFY(window.lblLegend()->text().contains(KpiGrid::Highest.name()));
     QVERIFY(!window.picLoad()->isVisible());
     QCOMPARE(window.shpProgress()->width(), window.shpProgress()->parentWidget()->width());
 
