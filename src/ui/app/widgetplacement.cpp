@@ -23,14 +23,32 @@ QRect availableArea(const QWidget &window)
     return screen ? screen->availableGeometry() : QRect();
 }
 
+// What the window system adds around a window, as seen on one already shown; a window not yet
+// shown is decorated the same way.
+QMargins frameMargins(const QWidget *shown)
+{
+    if (!shown || !shown->isVisible())
+        return {};
+    const QRect frame = shown->frameGeometry();
+    const QRect inner = shown->geometry();
+    return {inner.left() - frame.left(), inner.top() - frame.top(), frame.right() - inner.right(),
+            frame.bottom() - inner.bottom()};
+}
+
+// Places the window's frame at the rectangle: its position includes the frame, its size not.
+void placeFrame(QWidget &window, const QRect &frame, const QMargins &margins)
+{
+    window.move(frame.topLeft());
+    window.resize(frame.marginsRemoved(margins).size());
+}
+
 } // namespace
 
 void fitToScreen(QWidget &window)
 {
     const QRect area = availableArea(window);
     const QRect fitted = WindowPlacement::centredOver(window.size(), QRect(), area);
-    window.move(fitted.topLeft());
-    window.resize(fitted.size());
+    placeFrame(window, fitted, {});
 }
 
 void saveWindowPlacement(const QWidget &window, SettingsStore &store)
@@ -48,15 +66,15 @@ void restoreWindowPlacement(QWidget &window, SettingsStore &store, bool skipStat
 {
     const WindowPlacement placement = placementFor(window, store);
     const QRect area = availableArea(window);
+    const QWidget *parent = window.parentWidget() ? window.parentWidget()->window() : nullptr;
+    const QMargins margins = frameMargins(parent);
     QRect restored = placement.restore(window.objectName(), QRect(window.pos(), window.size()));
+    restored.setSize(restored.size().grownBy(margins));
     if (!placement.hasSavedPosition(window.objectName())) {
-        const QWidget *parent = window.parentWidget() ? window.parentWidget()->window() : nullptr;
         restored = WindowPlacement::centredOver(restored.size(),
                                                 parent ? parent->frameGeometry() : QRect(), area);
     }
-    restored = WindowPlacement::fittedInto(restored, area);
-    window.move(restored.topLeft());
-    window.resize(restored.size());
+    placeFrame(window, WindowPlacement::fittedInto(restored, area), margins);
     if (!skipState &&
         placement.savedState(window.objectName()) == WindowPlacement::State::Maximised)
         window.setWindowState(window.windowState() | Qt::WindowMaximized);

@@ -182,15 +182,16 @@ QWidget *MainWindow::buildKpiPanel()
     dates->addWidget(m_dateRange);
     dates->addWidget(butProduce);
     dates->addStretch();
-    dates->addWidget(m_chkCompare);
-    dates->addWidget(new QLabel(u"The Past"_s, m_kpiPanel));
-    dates->addWidget(m_lstCompareCount);
-    dates->addWidget(m_lstCompareType);
 
+    // The comparison's choice ends the tab buttons' row: the dates' row is full on a small screen.
     auto *tabs = new QHBoxLayout;
     m_tabButtons = new TabButtons(m_kpiPanel);
     connect(m_tabButtons, &TabButtons::tabClicked, this, &MainWindow::selectTab);
     tabs->addWidget(m_tabButtons, 1);
+    tabs->addWidget(m_chkCompare);
+    tabs->addWidget(new QLabel(u"The Past"_s, m_kpiPanel));
+    tabs->addWidget(m_lstCompareCount);
+    tabs->addWidget(m_lstCompareType);
 
     // The colour legend: what the cells' colours say.
     auto *legend = new QWidget(m_kpiPanel);
@@ -210,9 +211,10 @@ QWidget *MainWindow::buildKpiPanel()
             u"background: %1; padding: 2px 6px; border: 1px solid #B0B0B0;"_s.arg(colour.name()));
         legendRow->addWidget(entry);
     }
-    tabs->addWidget(legend);
 
     m_tabView = new KpiTabView(m_context, m_kpiPanel);
+    // Beside the tab's caption rather than the tab buttons, so that a narrow screen keeps both.
+    m_tabView->setCaptionCompanion(legend);
     // The Field's name takes the width the figures leave, as the window is resized.
     m_tabView->lstGrid()->setFittedColumn(m_tabView->grid().columnIndex(u"label"_s));
     auto *layout = new QVBoxLayout(m_kpiPanel);

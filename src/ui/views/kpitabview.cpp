@@ -12,6 +12,7 @@
 #include "views/kpigrid.h"
 #include "views/tabviewbuilder.h"
 
+#include <QHBoxLayout>
 #include <QLabel>
 #include <QVBoxLayout>
 
@@ -41,7 +42,10 @@ KpiTabView::KpiTabView(AppContext &context, QWidget *parent, int pastCount)
     m_gridView->setFittedColumn(m_grid.columnIndex(u"label"_s));
 
     auto *layout = new QVBoxLayout(this);
-    layout->addWidget(m_caption);
+    m_captionRow = new QHBoxLayout;
+    m_captionRow->addWidget(m_caption);
+    m_captionRow->addStretch();
+    layout->addLayout(m_captionRow);
     layout->addWidget(m_graph);
     layout->addWidget(m_gridView, 1);
 
@@ -88,6 +92,11 @@ void KpiTabView::showTab(int tab)
         m_graph->setBars(bars, m_pastCount > 0, m_pastCount + 1);
     }
     m_graph->setVisible(tab == TabViewBuilder::SummaryTab);
+}
+
+void KpiTabView::setCaptionCompanion(QWidget *widget)
+{
+    m_captionRow->addWidget(widget);
 }
 
 QString KpiTabView::periodName(int slot) const

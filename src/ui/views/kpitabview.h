@@ -8,6 +8,7 @@
 class AppContext;
 class GraphArea;
 class GridView;
+class QHBoxLayout;
 class QLabel;
 class TooltipPanel;
 
@@ -37,6 +38,8 @@ public:
     TooltipPanel *picTooltip() const { return m_tooltip; }
     QLabel *lblTab() const { return m_caption; }
 
+    // Puts a widget at the right of the caption's line (the main window's colour legend).
+    void setCaptionCompanion(QWidget *widget);
     // Opens the explanation of the row's Field under its "Field" cell.
     void explainRow(int row);
     // The months of a period slot as the comparison's legend and tips name them:
@@ -51,6 +54,7 @@ private:
     GridModel m_grid;
     int m_tab = 1;
     QLabel *m_caption;
+    QHBoxLayout *m_captionRow;
     GraphArea *m_graph;
     GridView *m_gridView;
     TooltipPanel *m_tooltip;

@@ -19,6 +19,9 @@ TabButtons::TabButtons(QWidget *parent)
         button->setAutoDefault(false);
         connect(button, &QPushButton::clicked, this, [this, tab] { Q_EMIT tabClicked(tab); });
         m_buttons << button;
+        // As narrow as the caption allows: seven buttons must share a small screen's width.
+        button->setMinimumWidth(
+            button->fontMetrics().horizontalAdvance(QString(captions[tab]).remove(u'&')) + 16);
         layout->addWidget(button);
     }
     layout->addStretch();
