@@ -1,7 +1,8 @@
 // Veltrix — KPI dashboard for small businesses.
+#include "clirun.h"
+
 #include "cipher/passwordcipher.h"
 #include "common/settings.h"
-
 #include "database/sqliteconnection.h"
 #include "sources/companyfile.h"
 
@@ -23,35 +24,11 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-struct Run
+// The range and account of a produce or report run.
+QStringList asUser(const QString &from, const QString &to, const QString &user,
+                   const QString &password)
 {
-    int exitCode = -1;
-    QString out;
-    QString err;
-};
-
-// Keeps the tool's per-user files (settings, data folder) inside the test.
-QTemporaryDir &home()
-{
-    static QTemporaryDir dir;
-    return dir;
-}
-
-Run runCli(const QStringList &arguments)
-{
-    QProcess process;
-    QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
-    environment.insert(u"XDG_CONFIG_HOME"_s, home().filePath(u"config"_s));
-    environment.insert(u"XDG_DATA_HOME"_s, home().filePath(u"data"_s));
-    process.setProcessEnvironment(environment);
-    process.start(QStringLiteral(VELTRIX_CLI), arguments);
-    Run run;
-    if (!process.waitForFinished(120000))
-        return run;
-    run.exitCode = process.exitCode();
-    run.out = QString::fromUtf8(process.readAllStandardOutput());
-    run.err = QString::fromUtf8(process.readAllStandardError());
-    return run;
+    return {u"--from"_s, from, u"--to"_s, to, u"--user"_s, user, u"--password"_s, password};
 }
 
 } // namespace
@@ -63,39 +40,36 @@ class TestCli : public QObject
 private Q_SLOTS:
     void passwordRoundTrip_data();
     void passwordRoundTrip();
-    void decryptsWhatTheProgramStores();
-    void undecipherableValueFails();
-    void badUsage_data();
-    void badUsage();
     void demoIsTheSameEveryTime();
     void produceCsv();
     void produceJsonWithComparison();
     void produceRespectsTheUsersLines();
     void produceShowsALossAsALoss();
     void produceIsHonestAboutItsFigures();
-    void produceRefuses_data();
-    void produceRefuses();
+    void refuses_data();
+    void refuses();
     void reportPdfShowsTitleGridAndGraph();
     void reportPrintsEveryBenchmark_data();
     void reportPrintsEveryBenchmark();
     void reportHtmlKeepsItsPicture();
-    void reportRefuses_data();
-    void reportRefuses();
     void encodeGif();
-    void encodeGifRefuses_data();
-    void encodeGifRefuses();
 
 private:
-    Run report(const QStringList &extra)
+    CliRun run(const QStringList &arguments) { return runCli(arguments, m_dir.path()); }
+    CliRun report(const QStringList &extra)
     {
-        return runCli(QStringList{u"report"_s, u"--settings"_s, demoFolder() + u"/settings.ini"_s,
-                                  u"--from"_s, u"2025-07"_s, u"--to"_s, u"2026-06"_s, u"--user"_s,
-                                  u"manager"_s, u"--password"_s, u"manager1"_s} +
-                      extra);
+        return run(QStringList{u"report"_s, u"--settings"_s, demoSettings()} +
+                   asUser(u"2025-07"_s, u"2026-06"_s, u"manager"_s, u"manager1"_s) + extra);
     }
-
+    QStringList produce(const QStringList &extra)
+    {
+        const CliRun done = run(QStringList{u"produce"_s, u"--settings"_s, demoSettings()} + extra);
+        if (done.exitCode != 0)
+            qWarning().noquote() << done.err;
+        return done.exitCode == 0 ? done.lines() : QStringList{u"exit %1"_s.arg(done.exitCode)};
+    }
     QString demoFolder();
-    QStringList produce(const QStringList &extra, int expectedExit = 0);
+    QString demoSettings() { return demoFolder() + u"/settings.ini"_s; }
 
     QTemporaryDir m_dir;
     bool m_demoMade = false;
@@ -104,21 +78,9 @@ private:
 QString TestCli::demoFolder()
 {
     const QString folder = m_dir.filePath(u"demo"_s);
-    if (!m_demoMade) {
-        const Run run = runCli({u"make-demo"_s, folder});
-        m_demoMade = run.exitCode == 0;
-    }
+    if (!m_demoMade)
+        m_demoMade = run({u"make-demo"_s, folder}).exitCode == 0;
     return folder;
-}
-
-QStringList TestCli::produce(const QStringList &extra, int expectedExit)
-{
-    const Run run = runCli(
-        QStringList{u"produce"_s, u"--settings"_s, demoFolder() + u"/settings.ini"_s} + extra);
-    if (run.exitCode != expectedExit)
-        qWarning().noquote() << run.err;
-    return run.exitCode == expectedExit ? run.out.split(u'\n', Qt::SkipEmptyParts)
-                                        : QStringList{u"exit %1"_s.arg(run.exitCode)};
 }
 
 namespace {
@@ -147,7 +109,7 @@ QByteArray journalDigest(const QString &companyFile)
 void TestCli::demoIsTheSameEveryTime()
 {
     const QString again = m_dir.filePath(u"demo-again"_s);
-    QCOMPARE(runCli({u"make-demo"_s, again}).exitCode, 0);
+    QCOMPARE(run({u"make-demo"_s, again}).exitCode, 0);
     const QString name = u"/Harbour Panel & Paint.myo"_s;
     const QByteArray first = journalDigest(demoFolder() + name);
     QVERIFY(!first.isEmpty());
@@ -156,8 +118,8 @@ void TestCli::demoIsTheSameEveryTime()
 
 void TestCli::produceCsv()
 {
-    const QStringList lines = produce({u"--from"_s, u"2025-07"_s, u"--to"_s, u"2026-06"_s,
-                                       u"--user"_s, u"manager"_s, u"--password"_s, u"manager1"_s});
+    const QStringList lines =
+        produce(asUser(u"2025-07"_s, u"2026-06"_s, u"manager"_s, u"manager1"_s));
     QCOMPARE(lines.first(),
              u"slot,id,tab,order,label,type,display,signed,abs,benchmark,variant,band"_s);
     QCOMPARE(lines.size(), 1 + 123);
@@ -177,10 +139,9 @@ void TestCli::produceCsv()
 
 void TestCli::produceJsonWithComparison()
 {
-    const QStringList lines =
-        produce({u"--from"_s, u"2025-01"_s, u"--to"_s, u"2025-03"_s, u"--user"_s, u"manager"_s,
-                 u"--password"_s, u"manager1"_s, u"--compare"_s, u"periods"_s, u"--count"_s, u"2"_s,
-                 u"--format"_s, u"json"_s});
+    const QStringList lines = produce(
+        asUser(u"2025-01"_s, u"2025-03"_s, u"manager"_s, u"manager1"_s) +
+        QStringList{u"--compare"_s, u"periods"_s, u"--count"_s, u"2"_s, u"--format"_s, u"json"_s});
     const QJsonArray rows = QJsonDocument::fromJson(lines.join(u'\n').toUtf8()).array();
     QCOMPARE(rows.size(), 3 * 123);
     QCOMPARE(rows.first().toObject().value(u"slot"_s).toString(), u"0"_s);
@@ -199,8 +160,8 @@ void TestCli::produceJsonWithComparison()
 
 void TestCli::produceRespectsTheUsersLines()
 {
-    const QStringList lines = produce({u"--from"_s, u"2025-07"_s, u"--to"_s, u"2025-07"_s,
-                                       u"--user"_s, u"WORKSHOP"_s, u"--password"_s, u"panel1"_s});
+    const QStringList lines =
+        produce(asUser(u"2025-07"_s, u"2025-07"_s, u"WORKSHOP"_s, u"panel1"_s));
     QSet<QString> tabsWithValues;
     for (const QString &line : lines.mid(1)) {
         const QStringList cells = line.split(u',');
@@ -212,40 +173,10 @@ void TestCli::produceRespectsTheUsersLines()
 
 void TestCli::produceShowsALossAsALoss()
 {
-    const QStringList lines = produce({u"--from"_s, u"2021-01"_s, u"--to"_s, u"2021-01"_s,
-                                       u"--user"_s, u"manager"_s, u"--password"_s, u"manager1"_s});
+    const QStringList lines =
+        produce(asUser(u"2021-01"_s, u"2021-01"_s, u"manager"_s, u"manager1"_s));
     const QString netProfit = lines.filter(u",6380,Net profit,5,"_s).value(0);
     QVERIFY2(netProfit.contains(u",\"$ -22,480.57\",-22480.57,22480.57,"_s), qPrintable(netProfit));
-}
-
-void TestCli::produceRefuses_data()
-{
-    QTest::addColumn<QStringList>("arguments");
-    QTest::addColumn<QString>("message");
-    QTest::newRow("wrong password")
-        << QStringList{u"--from"_s, u"2025-07"_s, u"--to"_s,       u"2025-07"_s,
-                       u"--user"_s, u"manager"_s, u"--password"_s, u"nope"_s}
-        << u"Login failed! Ensure your username and password are correct!"_s;
-    QTest::newRow("range backwards")
-        << QStringList{u"--from"_s, u"2025-07"_s, u"--to"_s,       u"2025-06"_s,
-                       u"--user"_s, u"sysop"_s,   u"--password"_s, u"sysop"_s}
-        << u"The selected date range is invalid!"_s;
-    QTest::newRow("year before the first")
-        << QStringList{u"--from"_s, u"1949-12"_s, u"--to"_s,       u"2025-06"_s,
-                       u"--user"_s, u"sysop"_s,   u"--password"_s, u"sysop"_s}
-        << u"in a year from 1950"_s;
-    QTest::newRow("negative year")
-        << QStringList{u"--from"_s, u"-0001-01"_s, u"--to"_s,       u"2025-06"_s,
-                       u"--user"_s, u"sysop"_s,    u"--password"_s, u"sysop"_s}
-        << u"in a year from 1950"_s;
-    QTest::newRow("month 13") << QStringList{u"--from"_s,  u"2025-13"_s, u"--to"_s,
-                                             u"2025-06"_s, u"--user"_s,  u"sysop"_s}
-                              << u"in a year from 1950"_s;
-    QTest::newRow("unreadable password file")
-        << QStringList{u"--from"_s,          u"2025-07"_s,      u"--to"_s,
-                       u"2025-07"_s,         u"--user"_s,       u"sysop"_s,
-                       u"--password-file"_s, u"/no/such/file"_s}
-        << u"cannot read the password file /no/such/file"_s;
 }
 
 void TestCli::produceIsHonestAboutItsFigures()
@@ -261,13 +192,12 @@ void TestCli::produceIsHonestAboutItsFigures()
         QVERIFY(QSqlQuery(connection.database()).exec(u"DROP TABLE JournalRecords"_s));
     }
     const QString settings = folder + u"/settings.ini"_s;
-    QVERIFY(QFile::copy(demoFolder() + u"/settings.ini"_s, settings));
+    QVERIFY(QFile::copy(demoSettings(), settings));
     QSettings(settings, QSettings::IniFormat)
         .setValue(u"SOFTWARE/Veltrix/AccFilePath"_s, companyFile);
-    const QStringList arguments{u"produce"_s, u"--settings"_s, settings,     u"--from"_s,
-                                u"2025-07"_s, u"--to"_s,       u"2025-07"_s, u"--user"_s,
-                                u"manager"_s, u"--password"_s, u"manager1"_s};
-    const Run broken = runCli(arguments);
+    const QStringList arguments = QStringList{u"produce"_s, u"--settings"_s, settings} +
+                                  asUser(u"2025-07"_s, u"2025-07"_s, u"manager"_s, u"manager1"_s);
+    const CliRun broken = run(arguments);
     QCOMPARE(broken.exitCode, 3);
     QVERIFY2(broken.err.contains(u"could not be read completely"_s), qPrintable(broken.err));
     QCOMPARE(broken.out, QString());
@@ -287,29 +217,86 @@ void TestCli::produceIsHonestAboutItsFigures()
     QVERIFY(file.open(QIODevice::WriteOnly));
     file.write("manager1\n");
     file.close();
-    QStringList fromFile = arguments.mid(0, 9);
-    fromFile << u"--password-file"_s << passwordFile;
-    QCOMPARE(runCli(fromFile).exitCode, 0);
+    QCOMPARE(run(arguments.mid(0, 9) << u"--password-file"_s << passwordFile).exitCode, 0);
     QCOMPARE(contentOf(), before);
     qputenv("VELTRIX_PASSWORD", "manager1");
-    const Run remembered =
-        runCli({u"produce"_s, u"--settings"_s, settings, u"--from"_s, u"2019-03"_s, u"--to"_s,
-                u"2019-03"_s, u"--user"_s, u"manager"_s, u"--remember"_s});
+    const CliRun remembered =
+        run({u"produce"_s, u"--settings"_s, settings, u"--from"_s, u"2019-03"_s, u"--to"_s,
+             u"2019-03"_s, u"--user"_s, u"manager"_s, u"--remember"_s});
     qunsetenv("VELTRIX_PASSWORD");
     QCOMPARE(remembered.exitCode, 0);
     QCOMPARE(QSettings(settings, QSettings::IniFormat).value(u"SOFTWARE/Veltrix/Y1"_s).toString(),
              u"2019"_s);
 }
 
-void TestCli::produceRefuses()
+void TestCli::refuses_data()
+{
+    QTest::addColumn<QStringList>("arguments");
+    QTest::addColumn<int>("exitCode");
+    QTest::addColumn<QString>("message"); // part of what is written to standard error
+    const QString usage = u"usage: veltrix-cli"_s;
+    QTest::newRow("no verb") << QStringList() << 2 << usage;
+    QTest::newRow("unknown verb") << QStringList{u"frobnicate"_s} << 2 << usage;
+    QTest::newRow("missing argument") << QStringList{u"encrypt-password"_s} << 2 << usage;
+    QTest::newRow("extra argument")
+        << QStringList{u"decrypt-password"_s, u"a"_s, u"b"_s} << 2 << usage;
+    QTest::newRow("password typed in clear") << QStringList{u"decrypt-password"_s, u"in-clear"_s}
+                                             << 1 << u"Failed decoding the text (Error 33)"_s;
+
+    const QStringList produce{u"produce"_s, u"--settings"_s, demoSettings()};
+    const QString notAMonth = u"in a year from 1950"_s;
+    QTest::newRow("wrong password")
+        << produce + asUser(u"2025-07"_s, u"2025-07"_s, u"manager"_s, u"nope"_s) << 2
+        << u"Login failed! Ensure your username and password are correct!"_s;
+    QTest::newRow("range backwards")
+        << produce + asUser(u"2025-07"_s, u"2025-06"_s, u"sysop"_s, u"sysop"_s) << 2
+        << u"The selected date range is invalid!"_s;
+    QTest::newRow("year before the first")
+        << produce + asUser(u"1949-12"_s, u"2025-06"_s, u"sysop"_s, u"sysop"_s) << 2 << notAMonth;
+    QTest::newRow("negative year")
+        << produce + asUser(u"-0001-01"_s, u"2025-06"_s, u"sysop"_s, u"sysop"_s) << 2 << notAMonth;
+    QTest::newRow("month 13")
+        << produce + asUser(u"2025-13"_s, u"2025-06"_s, u"sysop"_s, u"sysop"_s).mid(0, 6) << 2
+        << notAMonth;
+    QTest::newRow("unreadable password file")
+        << produce + asUser(u"2025-07"_s, u"2025-07"_s, u"sysop"_s, QString()).mid(0, 6) +
+               QStringList{u"--password-file"_s, u"/no/such/file"_s}
+        << 2 << u"cannot read the password file /no/such/file"_s;
+
+    const QStringList report = QStringList{u"report"_s, u"--settings"_s, demoSettings()} +
+                               asUser(u"2025-07"_s, u"2026-06"_s, u"manager"_s, u"manager1"_s);
+    const QString notAPage = u"--out names a .html or .pdf file"_s;
+    QTest::newRow("report: tab 7")
+        << report + QStringList{u"--tab"_s, u"7"_s, u"--out"_s, u"x.pdf"_s} << 2
+        << u"--tab is a number from 0 to 6"_s;
+    QTest::newRow("report: no out") << report << 2 << notAPage;
+    QTest::newRow("report: text out")
+        << report + QStringList{u"--out"_s, u"x.txt"_s} << 2 << notAPage;
+    QTest::newRow("report: compare decades")
+        << report + QStringList{u"--compare"_s, u"decades"_s, u"--out"_s, u"x.pdf"_s} << 2
+        << u"--compare is years or periods"_s;
+    QTest::newRow("report: no settings")
+        << report + QStringList{u"--settings"_s, u"/no/such/settings.ini"_s, u"--out"_s, u"x.pdf"_s}
+        << 2 << u"there is no settings file at /no/such/settings.ini"_s;
+
+    QTest::newRow("gif: one file") << QStringList{u"encode-gif"_s, u"a.png"_s} << 2 << u"usage"_s;
+    QTest::newRow("gif: bad colour")
+        << QStringList{u"encode-gif"_s, u"a.png"_s, u"b.gif"_s, u"--transparent"_s, u"white"_s} << 2
+        << u"RRGGBB"_s;
+    QTest::newRow("gif: missing picture")
+        << QStringList{u"encode-gif"_s, u"no-such.png"_s, u"b.gif"_s} << 1
+        << u"cannot read no-such.png"_s;
+}
+
+void TestCli::refuses()
 {
     QFETCH(QStringList, arguments);
+    QFETCH(int, exitCode);
     QFETCH(QString, message);
-    const Run run = runCli(
-        QStringList{u"produce"_s, u"--settings"_s, demoFolder() + u"/settings.ini"_s} + arguments);
-    QCOMPARE(run.exitCode, 2);
-    QVERIFY2(run.err.contains(message), qPrintable(run.err));
-    QCOMPARE(run.out, QString());
+    const CliRun refused = run(arguments);
+    QCOMPARE(refused.exitCode, exitCode);
+    QVERIFY2(refused.err.contains(message), qPrintable(refused.err));
+    QCOMPARE(refused.out, QString());
 }
 
 namespace {
@@ -344,16 +331,15 @@ void TestCli::reportPdfShowsTitleGridAndGraph()
         QFAIL("pdftotext and pdftoppm (poppler-utils) are needed; scripts/install-deps installs "
               "them");
     const QString pdf = m_dir.filePath(u"summary.pdf"_s);
-    const Run run = report({u"--out"_s, pdf});
-    QVERIFY2(run.exitCode == 0, qPrintable(run.err));
+    const CliRun done = report({u"--out"_s, pdf});
+    QVERIFY2(done.exitCode == 0, qPrintable(done.err));
 
     const QString text = runTool(u"pdftotext"_s, {u"-layout"_s, pdf, u"-"_s});
     QVERIFY2(text.contains(u"1/7/25 to 30/6/26"_s), qPrintable(text));
     // The text engine may set "fi" as one ligature glyph.
-    QVERIFY(text.contains(u"Panel labour gross pro"_s));
-    QVERIFY(text.contains(u"KEY PERFORMANCE INDICATORS"_s));
-    QVERIFY(text.contains(u"48.2%"_s));
-    QVERIFY(text.contains(u"Page 1 of 1"_s));
+    for (const QString &part : {u"Panel labour gross pro"_s, u"KEY PERFORMANCE INDICATORS"_s,
+                                u"48.2%"_s, u"Page 1 of 1"_s})
+        QVERIFY2(text.contains(part), qPrintable(part));
 
     const QString prefix = m_dir.filePath(u"summary-page"_s);
     runTool(u"pdftoppm"_s, {u"-png"_s, u"-r"_s, u"60"_s, u"-f"_s, u"1"_s, u"-l"_s, u"1"_s,
@@ -363,7 +349,6 @@ void TestCli::reportPdfShowsTitleGridAndGraph()
     const int heading = firstRowWith(page, qRgb(0xDD, 0x68, 0x00)); // the grid's headings
     const int bar = firstRowWith(page, qRgb(192, 255, 64));         // a green bar, reduced
     QVERIFY(heading >= 0);
-    QVERIFY(bar >= 0);
     QVERIFY(bar > heading); // the graph stands below the grid
 }
 
@@ -384,8 +369,8 @@ void TestCli::reportPrintsEveryBenchmark()
     QFETCH(int, benchmarks);
     QFETCH(QString, title);
     const QString pdf = m_dir.filePath(u"tab%1.pdf"_s.arg(tab));
-    const Run run = report({u"--tab"_s, tab, u"--out"_s, pdf});
-    QVERIFY2(run.exitCode == 0, qPrintable(run.err));
+    const CliRun done = report({u"--tab"_s, tab, u"--out"_s, pdf});
+    QVERIFY2(done.exitCode == 0, qPrintable(done.err));
     const QString text = runTool(u"pdftotext"_s, {u"-layout"_s, pdf, u"-"_s});
     static const QRegularExpression benchmark(u"[<>][0-9.]+%"_s);
     QCOMPARE(text.count(benchmark), benchmarks);
@@ -399,49 +384,25 @@ void TestCli::reportPrintsEveryBenchmark()
 void TestCli::reportHtmlKeepsItsPicture()
 {
     const QString html = m_dir.filePath(u"compare.html"_s);
-    const Run run = report({u"--compare"_s, u"years"_s, u"--count"_s, u"2"_s, u"--out"_s, html});
-    QVERIFY2(run.exitCode == 0, qPrintable(run.err));
-    QFile file(html);
-    QVERIFY(file.open(QIODevice::ReadOnly));
-    const QString page = QString::fromUtf8(file.readAll());
+    const CliRun done =
+        report({u"--compare"_s, u"years"_s, u"--count"_s, u"2"_s, u"--out"_s, html});
+    QVERIFY2(done.exitCode == 0, qPrintable(done.err));
+    const auto read = [](const QString &path) {
+        QFile file(path);
+        return file.open(QIODevice::ReadOnly) ? QString::fromUtf8(file.readAll()) : QString();
+    };
+    const QString page = read(html);
     const QString picture = m_dir.filePath(u"compare.bmp"_s);
     QVERIFY(page.startsWith(u"<html>\r\n<body bgcolor='#ffffff'"_s));
-    QVERIFY(page.contains(u"Jul 23 - Jun 24"_s));
-    QVERIFY(page.contains(u"Jul 25 - Jun 26"_s));
-    QVERIFY(page.contains(u">Average</td>"_s));
-    QVERIFY(page.contains(u"<img src='"_s + picture + u"'>"_s));
+    for (const QString &part : {u"Jul 23 - Jun 24"_s, u"Jul 25 - Jun 26"_s, u">Average</td>"_s,
+                                u"<img src='"_s + picture + u"'>"_s})
+        QVERIFY2(page.contains(part), qPrintable(part));
     QVERIFY(!QImage(picture).isNull());
 
     const QString grid = m_dir.filePath(u"labour.html"_s);
     QCOMPARE(report({u"--tab"_s, u"2"_s, u"--out"_s, grid}).exitCode, 0);
-    QFile labour(grid);
-    QVERIFY(labour.open(QIODevice::ReadOnly));
-    QVERIFY(!labour.readAll().contains("<img"));
-}
-
-void TestCli::reportRefuses_data()
-{
-    QTest::addColumn<QStringList>("arguments");
-    QTest::addColumn<QString>("message");
-    QTest::newRow("tab") << QStringList{u"--tab"_s, u"7"_s, u"--out"_s, u"x.pdf"_s}
-                         << u"--tab is a number from 0 to 6"_s;
-    QTest::newRow("no out") << QStringList{} << u"--out names a .html or .pdf file"_s;
-    QTest::newRow("text out") << QStringList{u"--out"_s, u"x.txt"_s}
-                              << u"--out names a .html or .pdf file"_s;
-    QTest::newRow("compare") << QStringList{u"--compare"_s, u"decades"_s, u"--out"_s, u"x.pdf"_s}
-                             << u"--compare is years or periods"_s;
-    QTest::newRow("settings") << QStringList{u"--settings"_s, u"/no/such/settings.ini"_s,
-                                             u"--out"_s, u"x.pdf"_s}
-                              << u"there is no settings file at /no/such/settings.ini"_s;
-}
-
-void TestCli::reportRefuses()
-{
-    QFETCH(QStringList, arguments);
-    QFETCH(QString, message);
-    const Run run = report(arguments);
-    QCOMPARE(run.exitCode, 2);
-    QVERIFY2(run.err.contains(message), qPrintable(run.err));
+    QVERIFY(read(grid).contains(u"</table>"_s));
+    QVERIFY(!read(grid).contains(u"<img"_s));
 }
 
 void TestCli::encodeGif()
@@ -455,8 +416,8 @@ void TestCli::encodeGif()
     const QString png = m_dir.filePath(u"picture.png"_s);
     const QString gif = m_dir.filePath(u"picture.gif"_s);
     QVERIFY(picture.save(png));
-    const Run run = runCli({u"encode-gif"_s, png, gif, u"--transparent"_s, u"FFFFFF"_s});
-    QVERIFY2(run.exitCode == 0, qPrintable(run.err));
+    const CliRun done = run({u"encode-gif"_s, png, gif, u"--transparent"_s, u"FFFFFF"_s});
+    QVERIFY2(done.exitCode == 0, qPrintable(done.err));
     QFile file(gif);
     QVERIFY(file.open(QIODevice::ReadOnly));
     const QByteArray bytes = file.readAll();
@@ -466,29 +427,6 @@ void TestCli::encodeGif()
     QCOMPARE(decoded.size(), picture.size());
     QCOMPARE(qAlpha(decoded.pixel(0, 0)), 0);
     QCOMPARE(decoded.pixel(15, 5), qRgb(192, 64, 0));
-}
-
-void TestCli::encodeGifRefuses_data()
-{
-    QTest::addColumn<QStringList>("arguments");
-    QTest::addColumn<int>("exitCode");
-    QTest::addColumn<QString>("message");
-    QTest::newRow("one file") << QStringList{u"a.png"_s} << 2 << u"usage"_s;
-    QTest::newRow("bad colour") << QStringList{u"a.png"_s, u"b.gif"_s, u"--transparent"_s,
-                                               u"white"_s}
-                                << 2 << u"RRGGBB"_s;
-    QTest::newRow("missing picture")
-        << QStringList{u"no-such.png"_s, u"b.gif"_s} << 1 << u"cannot read no-such.png"_s;
-}
-
-void TestCli::encodeGifRefuses()
-{
-    QFETCH(QStringList, arguments);
-    QFETCH(int, exitCode);
-    QFETCH(QString, message);
-    const Run run = runCli(QStringList{u"encode-gif"_s} + arguments);
-    QCOMPARE(run.exitCode, exitCode);
-    QVERIFY2(run.err.contains(message), qPrintable(run.err));
 }
 
 void TestCli::passwordRoundTrip_data()
@@ -501,48 +439,18 @@ void TestCli::passwordRoundTrip_data()
 void TestCli::passwordRoundTrip()
 {
     QFETCH(QString, password);
-    const Run encrypted = runCli({u"encrypt-password"_s, password});
+    const CliRun encrypted = run({u"encrypt-password"_s, password});
     QCOMPARE(encrypted.exitCode, 0);
     const QString stored = encrypted.out.trimmed();
     QVERIFY(!stored.isEmpty());
     QVERIFY(stored != password);
-
-    const Run decrypted = runCli({u"decrypt-password"_s, stored});
-    QCOMPARE(decrypted.exitCode, 0);
-    QCOMPARE(decrypted.out, password + u'\n');
-}
-
-void TestCli::decryptsWhatTheProgramStores()
-{
-    const QString stored = PasswordCipher().encryptText(u"garage"_s, Settings::PasswordKey);
-    const Run run = runCli({u"decrypt-password"_s, stored});
-    QCOMPARE(run.exitCode, 0);
-    QCOMPARE(run.out.trimmed(), u"garage"_s);
-}
-
-void TestCli::undecipherableValueFails()
-{
-    const Run run = runCli({u"decrypt-password"_s, u"typed-in-clear"_s});
-    QCOMPARE(run.exitCode, 1);
-    QCOMPARE(run.out, QString());
-    QCOMPARE(run.err.trimmed(), u"Failed decoding the text (Error 33)"_s);
-}
-
-void TestCli::badUsage_data()
-{
-    QTest::addColumn<QStringList>("arguments");
-    QTest::newRow("no verb") << QStringList();
-    QTest::newRow("unknown verb") << QStringList{u"frobnicate"_s};
-    QTest::newRow("missing argument") << QStringList{u"encrypt-password"_s};
-    QTest::newRow("extra argument") << QStringList{u"decrypt-password"_s, u"a"_s, u"b"_s};
-}
-
-void TestCli::badUsage()
-{
-    QFETCH(QStringList, arguments);
-    const Run run = runCli(arguments);
-    QCOMPARE(run.exitCode, 2);
-    QVERIFY(run.err.contains(u"usage: veltrix-cli"_s));
+    // What the tool writes and what the program stores both read back.
+    for (const QString &value :
+         {stored, PasswordCipher().encryptText(password, Settings::PasswordKey)}) {
+        const CliRun decrypted = run({u"decrypt-password"_s, value});
+        QCOMPARE(decrypted.exitCode, 0);
+        QCOMPARE(decrypted.out, password + u'\n');
+    }
 }
 
 QTEST_GUILESS_MAIN(TestCli)

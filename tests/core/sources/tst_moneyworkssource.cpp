@@ -304,22 +304,15 @@ void TestMoneyWorksSource::periodEnd()
     QFETCH(bool, refused);
     TestWorkspace workspace;
     QVERIFY(workspace.configure(u"MoneyWorks"_s));
-    QCOMPARE(loadSettings(workspace.context()), QString());
-    QCOMPARE(connectMainDatabase(workspace.context()), QString());
+    QVERIFY(workspace.connect());
     workspace.context().setNumberFormat(m_numbers);
-    workspace.context().settings().accFilePath =
-        u"http://127.0.0.1:%1/"_s.arg(m_simulator.port()) +
-        QString::fromLatin1(QUrl::toPercentEncoding(Document));
-    workspace.context().settings().accFileUser = u"Admin"_s;
-    workspace.context().settings().accFilePass = u"s3cret"_s;
-    QSqlQuery(workspace.context().mainDatabase().database())
-        .exec(u"UPDATE Fields SET Data = '4-1100' WHERE ID = 13"_s);
+    workspace.context().settings().accFilePath = m_simulator.address(Document);
+    QVERIFY(workspace.exec(u"UPDATE Fields SET Data = '4-1100' WHERE ID = 13"_s));
     workspace.context().mainDatabase().requeryFields();
 
-    const Settings &settings = workspace.context().settings();
     auto source = std::make_unique<MoneyWorksSource>(
-        settings, workspace.prompter(), workspace.context().numberFormat(),
-        [&settings] { return std::make_unique<RestMoneyWorksLink>(u"Admin"_s, u"s3cret"_s, 15); });
+        workspace.context().settings(), workspace.prompter(), workspace.context().numberFormat(),
+        [] { return std::make_unique<RestMoneyWorksLink>(u"Admin"_s, u"s3cret"_s, 15); });
     QCOMPARE(source->openDataFile(), std::nullopt);
     workspace.context().setAccountingSource(std::move(source));
     workspace.prompter().clearMessages();

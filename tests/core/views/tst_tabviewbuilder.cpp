@@ -29,7 +29,6 @@ private Q_SLOTS:
     void missingRecordIsReported();
     void averages_data();
     void averages();
-    void captions();
 
 private:
     AppContext &context() { return m_workspace->context(); }
@@ -319,12 +318,6 @@ void TestTabViewBuilder::averages()
     QCOMPARE(grid.cell(row, 7).back, averageBack);
     QCOMPARE(grid.cellText(row, 7), average);
     QCOMPARE(data.currentSlot(), quint8(2));
-}
-
-void TestTabViewBuilder::captions()
-{
-    QCOMPARE(TabViewBuilder::tabCaptions().size(), TabViewBuilder::TabCount);
-    QCOMPARE(TabViewBuilder::tabCaptions().at(4), u"Pai&nt"_s);
 }
 
 QTEST_GUILESS_MAIN(TestTabViewBuilder)

@@ -1,4 +1,5 @@
 // Veltrix — KPI dashboard for small businesses.
+#include "clirun.h"
 #include "modalwindow.h"
 #include "testworkspace.h"
 
@@ -29,7 +30,6 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QMenu>
-#include <QProcess>
 #include <QPushButton>
 #include <QRegularExpression>
 #include <QSqlQuery>
@@ -468,20 +468,12 @@ int rowWithId(const GridModel &grid, const QString &id)
 // veltrix-cli produce's display text of each Field, by ID.
 QHash<QString, QString> cliFigures(const QString &settings, const QString &home)
 {
-    QProcess process;
-    QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
-    environment.insert(u"XDG_CONFIG_HOME"_s, home + u"/config"_s);
-    environment.insert(u"XDG_DATA_HOME"_s, home + u"/data"_s);
-    process.setProcessEnvironment(environment);
-    process.start(QStringLiteral(VELTRIX_CLI),
-                  {u"produce"_s, u"--settings"_s, settings, u"--from"_s, u"2025-07"_s, u"--to"_s,
-                   u"2026-06"_s, u"--user"_s, u"sysop"_s, u"--password"_s, u"sysop"_s,
-                   u"--format"_s, u"json"_s});
+    const CliRun run = runCli({u"produce"_s, u"--settings"_s, settings, u"--from"_s, u"2025-07"_s,
+                               u"--to"_s, u"2026-06"_s, u"--user"_s, u"sysop"_s, u"--password"_s,
+                               u"sysop"_s, u"--format"_s, u"json"_s},
+                              home);
     QHash<QString, QString> figures;
-    if (!process.waitForFinished(120000))
-        return figures;
-    const QJsonArray records = QJsonDocument::fromJson(process.readAllStandardOutput()).array();
-    for (const QJsonValue &record : records)
+    for (const QJsonValue &record : QJsonDocument::fromJson(run.out.toUtf8()).array())
         figures.insert(record[u"id"_s].toString(), record[u"display"_s].toString());
     return figures;
 }
