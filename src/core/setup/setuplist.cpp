@@ -24,7 +24,7 @@ namespace {
 
 // Whether the row is still in the table; a failed look-up counts as present, so that the
 // failure is reported rather than passed over.
-bool rowExists(MainDatabase &database, Prompter &prompter, const QString &table, qint64 id)
+bool rowExists(MainDatabase &database, const QString &table, qint64 id)
 {
     QSqlQuery query(database.database());
     query.prepare(u"SELECT COUNT(*) FROM \""_s + table + u"\" WHERE ID = ?"_s);
@@ -58,7 +58,7 @@ bool SetupList::saveInto(MainDatabase &database, Prompter &prompter, RecordSet &
         if (!failure)
             continue;
         records.cancelUpdate();
-        if (failure->number == DbError::RowNotFound && !rowExists(database, prompter, table, id))
+        if (failure->number == DbError::RowNotFound && !rowExists(database, table, id))
             continue;
         ErrorReporter(prompter).reportError(failure->number, failure->description, errorContext);
         return false;
