@@ -140,6 +140,34 @@ QString ReportRenderer::printableHtml(const QString &html)
     return printable;
 }
 
+void ReportRenderer::showPicturesAtTheirSize(QTextDocument &document, double maxWidth)
+{
+    constexpr double ScreenDotsPerMeter = 96.0 / 0.0254;
+    QTextCursor cursor(&document);
+    for (QTextBlock block = document.begin(); block.isValid(); block = block.next()) {
+        for (auto it = block.begin(); !it.atEnd(); ++it) {
+            const QTextFragment fragment = it.fragment();
+            QTextImageFormat format = fragment.charFormat().toImageFormat();
+            if (!format.isValid() || format.hasProperty(QTextFormat::ImageWidth))
+                continue;
+            const QUrl url = document.baseUrl().resolved(QUrl(format.name()));
+            const QImage picture(url.isLocalFile() ? url.toLocalFile() : format.name());
+            if (picture.isNull())
+                continue;
+            double density = std::max(1.0, picture.dotsPerMeterX() / ScreenDotsPerMeter);
+            if (maxWidth > 0.0)
+                density = std::max(density, picture.width() / maxWidth);
+            if (density <= 1.05)
+                continue;
+            format.setWidth(picture.width() / density);
+            format.setHeight(picture.height() / density);
+            cursor.setPosition(fragment.position());
+            cursor.setPosition(fragment.position() + fragment.length(), QTextCursor::KeepAnchor);
+            cursor.setCharFormat(format);
+        }
+    }
+}
+
 ReportRenderer::Margins ReportRenderer::expandCodes(const QString &text, int page, int pages,
                                                     const QDate &today, const QLocale &locale,
                                                     const QString &windowTitle)
@@ -212,6 +240,7 @@ int ReportRenderer::print(QPagedPaintDevice &device, const PrintOptions &options
     // Lay the page out at browser size, then scale it onto the device; a page wider than the
     // paper is shrunk to fit rather than cut off.
     const double bodyWidthCss = body.width() / dpiX * CssDpi;
+    showPicturesAtTheirSize(document, bodyWidthCss);
     document.setTextWidth(bodyWidthCss);
     double layoutWidth = bodyWidthCss;
     if (options.shrinkToFit && document.idealWidth() > bodyWidthCss) {

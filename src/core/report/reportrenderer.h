@@ -40,6 +40,10 @@ public:
 
     // The page as the renderer lays it out, for tests and previews.
     static QString printableHtml(const QString &html);
+    // Pictures stored at a screen's higher density are shown at the size they stand for
+    // (a browser would show every pixel of them); the preview does the same. With a width,
+    // a wider picture is scaled down to it rather than shrinking the whole page around it.
+    static void showPicturesAtTheirSize(QTextDocument &document, double maxWidth = 0.0);
 
 private:
     QString m_html;

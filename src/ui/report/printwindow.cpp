@@ -135,6 +135,7 @@ void PrintWindow::showPage(const QString &pagePath, const QString &title)
     m_ieFrame->document()->setBaseUrl(
         QUrl::fromLocalFile(QFileInfo(pagePath).absolutePath() + u'/'));
     m_ieFrame->setHtml(ReportRenderer::printableHtml(m_html));
+    ReportRenderer::showPicturesAtTheirSize(*m_ieFrame->document());
     m_txtHeader->setText(title);
 }
 

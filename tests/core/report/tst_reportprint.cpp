@@ -9,6 +9,7 @@
 #include <QTemporaryDir>
 #include <QTest>
 #include <QTextDocument>
+#include <QUrl>
 
 using namespace Qt::StringLiterals;
 
@@ -79,6 +80,8 @@ private Q_SLOTS:
     void expandCodes();
     void printableHtml_data();
     void printableHtml();
+    void picturesKeepTheirSize_data();
+    void picturesKeepTheirSize();
     void printsHeaderFooterAndPages();
     void backgroundsFollowTheOption();
     void pictureIsPrintedAndWidePagesShrink();
@@ -144,6 +147,38 @@ void TestReportPrint::printableHtml()
     QTextDocument document;
     document.setHtml(ReportRenderer::printableHtml(html));
     QCOMPARE(document.toPlainText().trimmed(), shown.trimmed());
+}
+
+void TestReportPrint::picturesKeepTheirSize_data()
+{
+    QTest::addColumn<double>("ratio");     // of the screen the picture was grabbed from
+    QTest::addColumn<double>("pageWidth"); // 0: no limit
+    QTest::addColumn<double>("shownWidth");
+    QTest::newRow("ordinary screen") << 1.0 << 0.0 << 400.0;
+    QTest::newRow("twice as dense") << 2.0 << 0.0 << 200.0;
+    QTest::newRow("one and a half") << 1.5 << 0.0 << 400.0 / 1.5;
+    QTest::newRow("wider than the page") << 1.0 << 300.0 << 300.0;
+    QTest::newRow("dense and still too wide") << 1.25 << 300.0 << 300.0;
+}
+
+void TestReportPrint::picturesKeepTheirSize()
+{
+    QFETCH(double, ratio);
+    QFETCH(double, pageWidth);
+    QFETCH(double, shownWidth);
+    QImage picture(400, 100, QImage::Format_RGB32);
+    picture.fill(Qt::blue);
+    picture.setDotsPerMeterX(int(std::lround(96.0 / 0.0254 * ratio)));
+    picture.setDotsPerMeterY(picture.dotsPerMeterX());
+    const QString bmp = m_folder.filePath(u"tmp.bmp"_s);
+    QVERIFY(picture.save(bmp, "BMP"));
+    QTextDocument document;
+    document.setDocumentMargin(0);
+    document.setBaseUrl(QUrl::fromLocalFile(m_folder.path() + u'/'));
+    document.setHtml(u"<p><img src='"_s + bmp + u"'></p>"_s);
+    ReportRenderer::showPicturesAtTheirSize(document, pageWidth);
+    document.setTextWidth(1000);
+    QCOMPARE(std::round(document.idealWidth()), std::round(shownWidth));
 }
 
 void TestReportPrint::printsHeaderFooterAndPages()

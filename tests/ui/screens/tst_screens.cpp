@@ -8,6 +8,7 @@
 #include "app/widgetplacement.h"
 #include "main/mainwindow.h"
 #include "report/gridhtml.h"
+#include "report/gridreport.h"
 #include "report/pagesetup.h"
 #include "report/reportrenderer.h"
 #include "views/bargraphitem.h"
@@ -125,21 +126,26 @@ void TestScreens::comparisonOfFourYears()
 
 void TestScreens::printedPages()
 {
-    m_main->selectTab(0);
-    const QString pdf = m_folder + u"/print-all"_s + m_suffix + u".pdf"_s;
-    {
-        QPdfWriter writer(pdf);
-        writer.setResolution(int(96 * QGuiApplication::primaryScreen()->devicePixelRatio()));
-        PrintOptions options;
-        options.printBackground = true;
-        const QString page = GridHtml::reportPage(m_main->tabView()->grid(), u"id"_s, {});
-        QVERIFY(ReportRenderer(page, m_folder).print(writer, options) >= 2);
+    // All lines over several pages, and the Summary with its graph's picture, which keeps the
+    // graph's size whatever the screen's density.
+    for (const int tab : {0, int(TabViewBuilder::SummaryTab)}) {
+        m_main->selectTab(tab);
+        const QString picture = GridReport::graphPicture(m_workspace.context(), *m_main->tabView());
+        QCOMPARE(picture.isEmpty(), tab == 0);
+        const QString name = m_folder + u"/print-tab%1"_s.arg(tab) + m_suffix;
+        {
+            QPdfWriter writer(name + u".pdf"_s);
+            PrintOptions options;
+            options.printBackground = true;
+            const QString page = GridHtml::reportPage(m_main->tabView()->grid(), u"id"_s, picture);
+            QCOMPARE(ReportRenderer(page, m_folder).print(writer, options) >= 2, tab == 0);
+        }
+        QProcess render;
+        render.start(u"pdftoppm"_s, {u"-png"_s, u"-r"_s, u"80"_s, u"-f"_s, u"1"_s, u"-l"_s, u"2"_s,
+                                     name + u".pdf"_s, name});
+        QVERIFY(render.waitForFinished(60000));
+        QCOMPARE(render.exitCode(), 0);
     }
-    QProcess render;
-    render.start(u"pdftoppm"_s, {u"-png"_s, u"-r"_s, u"80"_s, u"-f"_s, u"1"_s, u"-l"_s, u"2"_s, pdf,
-                                 m_folder + u"/print-page"_s + m_suffix});
-    QVERIFY(render.waitForFinished(60000));
-    QCOMPARE(render.exitCode(), 0);
 }
 
 QTEST_MAIN(TestScreens)
