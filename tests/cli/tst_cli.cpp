@@ -38,7 +38,6 @@ class TestCli : public QObject
     Q_OBJECT
 
 private Q_SLOTS:
-    void passwordRoundTrip_data();
     void passwordRoundTrip();
     void demoIsTheSameEveryTime();
     void produceCsv();
@@ -48,7 +47,6 @@ private Q_SLOTS:
     void produceIsHonestAboutItsFigures();
     void refuses_data();
     void refuses();
-    void reportPdfShowsTitleGridAndGraph();
     void reportPrintsEveryBenchmark_data();
     void reportPrintsEveryBenchmark();
     void reportHtmlKeepsItsPicture();
@@ -238,8 +236,6 @@ void TestCli::refuses_data()
     QTest::newRow("no verb") << QStringList() << 2 << usage;
     QTest::newRow("unknown verb") << QStringList{u"frobnicate"_s} << 2 << usage;
     QTest::newRow("missing argument") << QStringList{u"encrypt-password"_s} << 2 << usage;
-    QTest::newRow("extra argument")
-        << QStringList{u"decrypt-password"_s, u"a"_s, u"b"_s} << 2 << usage;
     QTest::newRow("password typed in clear") << QStringList{u"decrypt-password"_s, u"in-clear"_s}
                                              << 1 << u"Failed decoding the text (Error 33)"_s;
 
@@ -253,8 +249,6 @@ void TestCli::refuses_data()
         << u"The selected date range is invalid!"_s;
     QTest::newRow("year before the first")
         << produce + asUser(u"1949-12"_s, u"2025-06"_s, u"sysop"_s, u"sysop"_s) << 2 << notAMonth;
-    QTest::newRow("negative year")
-        << produce + asUser(u"-0001-01"_s, u"2025-06"_s, u"sysop"_s, u"sysop"_s) << 2 << notAMonth;
     QTest::newRow("month 13")
         << produce + asUser(u"2025-13"_s, u"2025-06"_s, u"sysop"_s, u"sysop"_s).mid(0, 6) << 2
         << notAMonth;
@@ -270,8 +264,6 @@ void TestCli::refuses_data()
         << report + QStringList{u"--tab"_s, u"7"_s, u"--out"_s, u"x.pdf"_s} << 2
         << u"--tab is a number from 0 to 6"_s;
     QTest::newRow("report: no out") << report << 2 << notAPage;
-    QTest::newRow("report: text out")
-        << report + QStringList{u"--out"_s, u"x.txt"_s} << 2 << notAPage;
     QTest::newRow("report: compare decades")
         << report + QStringList{u"--compare"_s, u"decades"_s, u"--out"_s, u"x.pdf"_s} << 2
         << u"--compare is years or periods"_s;
@@ -279,7 +271,6 @@ void TestCli::refuses_data()
         << report + QStringList{u"--settings"_s, u"/no/such/settings.ini"_s, u"--out"_s, u"x.pdf"_s}
         << 2 << u"there is no settings file at /no/such/settings.ini"_s;
 
-    QTest::newRow("gif: one file") << QStringList{u"encode-gif"_s, u"a.png"_s} << 2 << u"usage"_s;
     QTest::newRow("gif: bad colour")
         << QStringList{u"encode-gif"_s, u"a.png"_s, u"b.gif"_s, u"--transparent"_s, u"white"_s} << 2
         << u"RRGGBB"_s;
@@ -325,33 +316,6 @@ int firstRowWith(const QImage &image, QRgb colour)
 
 } // namespace
 
-void TestCli::reportPdfShowsTitleGridAndGraph()
-{
-    if (QStandardPaths::findExecutable(u"pdftoppm"_s).isEmpty())
-        QFAIL("pdftotext and pdftoppm (poppler-utils) are needed; scripts/install-deps installs "
-              "them");
-    const QString pdf = m_dir.filePath(u"summary.pdf"_s);
-    const CliRun done = report({u"--out"_s, pdf});
-    QVERIFY2(done.exitCode == 0, qPrintable(done.err));
-
-    const QString text = runTool(u"pdftotext"_s, {u"-layout"_s, pdf, u"-"_s});
-    QVERIFY2(text.contains(u"1/7/25 to 30/6/26"_s), qPrintable(text));
-    // The text engine may set "fi" as one ligature glyph.
-    for (const QString &part : {u"Panel labour gross pro"_s, u"KEY PERFORMANCE INDICATORS"_s,
-                                u"48.2%"_s, u"Page 1 of 1"_s})
-        QVERIFY2(text.contains(part), qPrintable(part));
-
-    const QString prefix = m_dir.filePath(u"summary-page"_s);
-    runTool(u"pdftoppm"_s, {u"-png"_s, u"-r"_s, u"60"_s, u"-f"_s, u"1"_s, u"-l"_s, u"1"_s,
-                            u"-singlefile"_s, pdf, prefix});
-    const QImage page(prefix + u".png"_s);
-    QVERIFY(!page.isNull());
-    const int heading = firstRowWith(page, qRgb(0xDD, 0x68, 0x00)); // the grid's headings
-    const int bar = firstRowWith(page, qRgb(192, 255, 64));         // a green bar, reduced
-    QVERIFY(heading >= 0);
-    QVERIFY(bar > heading); // the graph stands below the grid
-}
-
 void TestCli::reportPrintsEveryBenchmark_data()
 {
     QTest::addColumn<QString>("tab");
@@ -368,10 +332,28 @@ void TestCli::reportPrintsEveryBenchmark()
     QFETCH(QString, tab);
     QFETCH(int, benchmarks);
     QFETCH(QString, title);
+    if (QStandardPaths::findExecutable(u"pdftoppm"_s).isEmpty())
+        QFAIL("pdftotext and pdftoppm (poppler-utils) are needed; scripts/install-deps installs "
+              "them");
     const QString pdf = m_dir.filePath(u"tab%1.pdf"_s.arg(tab));
     const CliRun done = report({u"--tab"_s, tab, u"--out"_s, pdf});
     QVERIFY2(done.exitCode == 0, qPrintable(done.err));
     const QString text = runTool(u"pdftotext"_s, {u"-layout"_s, pdf, u"-"_s});
+    if (tab == u"1"_s) {
+        // The text engine may set "fi" as one ligature glyph.
+        for (const QString &part : {u"Panel labour gross pro"_s, u"KEY PERFORMANCE INDICATORS"_s,
+                                    u"48.2%"_s, u"Page 1 of 1"_s})
+            QVERIFY2(text.contains(part), qPrintable(part));
+        // The graph stands below the grid.
+        const QString prefix = m_dir.filePath(u"summary-page"_s);
+        runTool(u"pdftoppm"_s, {u"-png"_s, u"-r"_s, u"60"_s, u"-f"_s, u"1"_s, u"-l"_s, u"1"_s,
+                                u"-singlefile"_s, pdf, prefix});
+        const QImage page(prefix + u".png"_s);
+        const int heading = firstRowWith(page, qRgb(0xDD, 0x68, 0x00)); // the grid's headings
+        const int bar = firstRowWith(page, qRgb(192, 255, 64));         // a green bar, reduced
+        QVERIFY(heading >= 0);
+        QVERIFY(bar > heading);
+    }
     static const QRegularExpression benchmark(u"[<>][0-9.]+%"_s);
     QCOMPARE(text.count(benchmark), benchmarks);
     // Every page names the tab and the range and repeats the column headings.
@@ -429,16 +411,9 @@ void TestCli::encodeGif()
     QCOMPARE(decoded.pixel(15, 5), qRgb(192, 64, 0));
 }
 
-void TestCli::passwordRoundTrip_data()
-{
-    QTest::addColumn<QString>("password");
-    QTest::newRow("plain") << u"Sp@nner 7"_s;
-    QTest::newRow("quote and accent") << u"O'Brien caf\u00e9"_s;
-}
-
 void TestCli::passwordRoundTrip()
 {
-    QFETCH(QString, password);
+    const QString password = u"O'Brien caf\u00e9 7"_s;
     const CliRun encrypted = run({u"encrypt-password"_s, password});
     QCOMPARE(encrypted.exitCode, 0);
     const QString stored = encrypted.out.trimmed();

@@ -14,9 +14,7 @@ class TestBarLayout : public QObject
 private Q_SLOTS:
     void bars_data();
     void bars();
-    void denserScreensScaleUp();
-    void tooltips_data();
-    void tooltips();
+    void denserScreensScaleUpAndVariantsAreSigned();
     void spread_data();
     void spread();
 
@@ -63,28 +61,15 @@ void TestBarLayout::bars()
     QCOMPARE(int(bar.evaluation.band), band);
 }
 
-void TestBarLayout::denserScreensScaleUp()
+void TestBarLayout::denserScreensScaleUpAndVariantsAreSigned()
 {
     QCOMPARE(BarLayout::scale(15.0), 2.0);
     QCOMPARE(BarLayout::scale(10.0), 3.0);
     QCOMPARE(BarLayout::scale(0.0), 2.0);
     QCOMPARE(BarLayout::layoutBar(u"<30"_s, 25.0, 10.0, m_numbers).columnHeight, 90);
-}
-
-void TestBarLayout::tooltips_data()
-{
-    QTest::addColumn<double>("variant");
-    QTest::addColumn<QString>("text");
-    QTest::newRow("above") << 2.5 << u"+2.5%"_s;
-    QTest::newRow("below") << -3.0 << u"-3%"_s;
-    QTest::newRow("on it") << 0.0 << u"0%"_s;
-}
-
-void TestBarLayout::tooltips()
-{
-    QFETCH(double, variant);
-    QFETCH(QString, text);
-    QCOMPARE(BarLayout::tooltip(variant, m_numbers), text);
+    QCOMPARE(BarLayout::tooltip(2.5, m_numbers), u"+2.5%"_s);
+    QCOMPARE(BarLayout::tooltip(-3.0, m_numbers), u"-3%"_s);
+    QCOMPARE(BarLayout::tooltip(0.0, m_numbers), u"0%"_s);
 }
 
 void TestBarLayout::spread_data()

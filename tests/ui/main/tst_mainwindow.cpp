@@ -1,4 +1,5 @@
 // Veltrix — KPI dashboard for small businesses.
+#include "../setupedit.h"
 #include "clirun.h"
 #include "modalwindow.h"
 #include "testworkspace.h"
@@ -9,10 +10,10 @@
 #include "common/fileoperations.h"
 #include "database/configvalues.h"
 #include "grid/gridmodel.h"
+#include "grid/gridoperations.h"
 #include "main/mainwindow.h"
 #include "report/gridreport.h"
 #include "report/printwindow.h"
-#include "setup/celleditor.h"
 #include "setup/hourlyratesdialog.h"
 #include "setup/programsetupdialog.h"
 #include "views/bargraphitem.h"
@@ -36,6 +37,7 @@
 #include <QTest>
 
 using namespace Qt::StringLiterals;
+using GridOperations::findGridRow;
 
 class TestMainWindow : public QObject
 {
@@ -44,7 +46,6 @@ class TestMainWindow : public QObject
 private Q_SLOTS:
     void init();
     void cleanup();
-    void loginInAnyCaseGreetsTheStoredName();
     void builtInAccountWithNoUsers();
     void stepButtons_data();
     void stepButtons();
@@ -56,8 +57,8 @@ private Q_SLOTS:
     void shutdownRequestEndsTheProgramUnderADialog();
     void produceShowsTheDemoFigures();
     void nextUserSeesNothingOfTheLast();
-    void setupMenuFollowsTheUser_data();
-    void setupMenuFollowsTheUser();
+    void loginFollowsTheAccount_data();
+    void loginFollowsTheAccount();
     void mappingAndRatesReachTheNextProduce();
 
 private:
@@ -103,39 +104,6 @@ void TestMainWindow::init()
 void TestMainWindow::cleanup()
 {
     m_workspace.reset();
-}
-
-void TestMainWindow::loginInAnyCaseGreetsTheStoredName()
-{
-    auto window = openWindow(*m_workspace);
-    QVERIFY(window);
-    addUser(*m_workspace, u"bob"_s);
-    addUser(*m_workspace, u"ann_1"_s);
-    addUser(*m_workspace, u"annA1"_s);
-    m_workspace->prompter().clearMessages();
-    window->login(u"ann_1"_s, u"wrong"_s); // "_" is a character: only ann_1's password counts
-    QCOMPARE(m_workspace->prompter().messages().size(), 1);
-    QCOMPARE(m_workspace->prompter().messages().first().title, u"Login Failed"_s);
-    QCOMPARE(m_workspace->prompter().messages().first().text,
-             u"Login failed! Ensure your username and password are correct!"_s);
-    QVERIFY(!m_workspace->context().loginState().loggedIn);
-
-    window->login(u"Bob"_s, u"pw"_s);
-    QCOMPARE(window->lblLoggedIn()->text(), u"Welcome, bob"_s);
-    QCOMPARE(window->lblActiveUsers()->text(), u"1 user is logged in"_s);
-    QVERIFY(!window->menuSetup()->isEnabled());
-    // A log-off the database cannot record leaves the session as it was.
-    QSqlQuery sql(m_workspace->context().mainDatabase().database());
-    QVERIFY(sql.exec(u"ALTER TABLE Config RENAME TO Gone"_s));
-    QVERIFY(!window->logoff(true));
-    QVERIFY(m_workspace->prompter().messages().last().title.startsWith(u"Logoff Error"_s));
-    QCOMPARE(window->lblActiveUsers()->text(), u"1 user is logged in"_s);
-    QVERIFY(sql.exec(u"ALTER TABLE Gone RENAME TO Config"_s));
-    window->logoff(true);
-    QCOMPARE(ConfigValues(m_workspace->context().mainDatabase(), m_workspace->prompter())
-                 .getConfigValue(4),
-             u"0"_s);
-    QVERIFY(!window->itemLogoff()->isEnabled());
 }
 
 void TestMainWindow::builtInAccountWithNoUsers()
@@ -249,12 +217,8 @@ void TestMainWindow::yearIsCheckedBeforeUse()
 
 void TestMainWindow::clockFormat()
 {
-    QCOMPARE(MainWindow::clockText(QDateTime(QDate(2026, 12, 5), QTime(9, 5))),
-             u"Saturday, 5 Dec 2026 9:05 AM"_s);
-    QCOMPARE(MainWindow::clockText(QDateTime(QDate(2026, 12, 5), QTime(21, 30))),
-             u"Saturday, 5 Dec 2026 9:30 PM"_s);
-    QCOMPARE(MainWindow::clockText(QDateTime(QDate(2026, 6, 1), QTime(14, 0))),
-             u"Monday, 1 Jun 2026 2:00 PM"_s);
+    QCOMPARE(MainWindow::clockText(QDateTime(QDate(2026, 12, 5), QTime(21, 5))),
+             u"Saturday, 5 Dec 2026 9:05 PM"_s);
     QCOMPARE(MainWindow::clockText(QDateTime(QDate(2026, 9, 1), QTime(0, 7))),
              u"Tuesday, 1 Sep 2026 12:07 AM"_s);
 }
@@ -388,11 +352,25 @@ void TestMainWindow::nextUserSeesNothingOfTheLast()
             QVERIFY(allowed.contains(QString::number(bar->tag())));
     };
 
-    // Manager compares; a network request logs everyone off while the comparison is open.
+    // Manager compares three years back; a network request logs everyone off while the
+    // comparison is open.
     window->login(u"manager"_s, u"manager1"_s);
+    window->lstMonth1()->setCurrentIndex(6);
+    window->lstYear1()->setEditText(u"2025"_s);
+    window->lstMonth2()->setCurrentIndex(5);
+    window->lstYear2()->setEditText(u"2026"_s);
     window->chkCompare()->setChecked(true);
+    window->lstCompareCount()->setCurrentIndex(2);
+    window->lstCompareType()->setCurrentIndex(1);
     whenModalOpens<CompareWindow>([&](CompareWindow &compare) {
         QTRY_VERIFY_WITH_TIMEOUT(!compare.isLoading(), 60000);
+        const GridModel &grid = compare.tabView()->grid();
+        QStringList headers;
+        for (const QString &key : {u"value3"_s, u"value2"_s, u"value1"_s, u"value"_s})
+            headers << grid.column(grid.columnIndex(key)).header;
+        QCOMPARE(headers, (QStringList{u"Jul 22 - Jun 23"_s, u"Jul 23 - Jun 24"_s,
+                                       u"Jul 24 - Jun 25"_s, u"Jul 25 - Jun 26"_s}));
+        QVERIFY(!grid.column(grid.columnIndex(u"value4"_s)).visible);
         QVERIFY(!ConfigValues(m_workspace->context().mainDatabase(), m_workspace->prompter())
                      .setConfigValue(5, u"Logoff"_s));
         window->pollUsers();
@@ -414,21 +392,26 @@ void TestMainWindow::nextUserSeesNothingOfTheLast()
     window->produce();
 }
 
-void TestMainWindow::setupMenuFollowsTheUser_data()
+void TestMainWindow::loginFollowsTheAccount_data()
 {
     QTest::addColumn<QString>("user");
     QTest::addColumn<QString>("password");
+    QTest::addColumn<QString>("welcome"); // empty: refused
     QTest::addColumn<bool>("menu");
     QTest::addColumn<bool>("mapping");
-    QTest::newRow("built-in account") << u"sysop"_s << u"sysop"_s << true << true;
-    QTest::newRow("administrator") << u"manager"_s << u"manager1"_s << true << false;
-    QTest::newRow("standard user") << u"workshop"_s << u"panel1"_s << false << false;
+    QTest::newRow("built-in account") << u"sysop"_s << u"sysop"_s << u"sysop"_s << true << true;
+    QTest::newRow("administrator in another case")
+        << u"MANAGER"_s << u"manager1"_s << u"manager"_s << true << false;
+    QTest::newRow("standard user")
+        << u"workshop"_s << u"panel1"_s << u"workshop"_s << false << false;
+    QTest::newRow("wrong password") << u"manager"_s << u"Manager1"_s << QString() << false << false;
 }
 
-void TestMainWindow::setupMenuFollowsTheUser()
+void TestMainWindow::loginFollowsTheAccount()
 {
     QFETCH(QString, user);
     QFETCH(QString, password);
+    QFETCH(QString, welcome);
     QFETCH(bool, menu);
     QFETCH(bool, mapping);
     QTemporaryDir dir;
@@ -438,32 +421,42 @@ void TestMainWindow::setupMenuFollowsTheUser()
     QCOMPARE(window->menuSetup()->isEnabled(), menu);
     QCOMPARE(window->itemSetupUsers()->isEnabled(), menu);
     QCOMPARE(window->itemSetupMapping()->isEnabled(), mapping);
-    QVERIFY(window->itemPrint()->isEnabled());
+    QCOMPARE(window->itemPrint()->isEnabled(), !welcome.isEmpty());
+    const auto &messages = m_workspace->prompter().messages();
+    if (welcome.isEmpty()) {
+        QCOMPARE(messages.size(), 1);
+        QCOMPARE(messages.first().title, u"Login Failed"_s);
+        QCOMPARE(messages.first().text,
+                 u"Login failed! Ensure your username and password are correct!"_s);
+        QVERIFY(!m_workspace->context().loginState().loggedIn);
+        return;
+    }
+    QCOMPARE(window->lblLoggedIn()->text(), u"Welcome, "_s + welcome);
+    const QString counted =
+        welcome == u"sysop"_s ? u"0 users are logged in"_s : u"1 user is logged in"_s;
+    QCOMPARE(window->lblActiveUsers()->text(), counted);
+    // A log-off the database cannot record leaves the session as it was; the built-in account
+    // is not counted, so its log-off records nothing.
+    QSqlQuery sql(m_workspace->context().mainDatabase().database());
+    QVERIFY(sql.exec(u"ALTER TABLE Config RENAME TO Gone"_s));
+    const bool builtIn = welcome == u"sysop"_s;
+    QCOMPARE(window->logoff(true), builtIn);
+    if (!builtIn) {
+        QVERIFY(messages.last().title.startsWith(u"Logoff Error"_s));
+        QCOMPARE(window->lblActiveUsers()->text(), counted);
+        QVERIFY(window->itemLogoff()->isEnabled());
+    }
+    QVERIFY(sql.exec(u"ALTER TABLE Gone RENAME TO Config"_s));
     window->logoff(true);
+    QCOMPARE(ConfigValues(m_workspace->context().mainDatabase(), m_workspace->prompter())
+                 .getConfigValue(4),
+             u"0"_s);
     QVERIFY(!window->menuSetup()->isEnabled());
     QVERIFY(!window->itemPrint()->isEnabled());
+    QVERIFY(!window->itemLogoff()->isEnabled());
 }
 
 namespace {
-
-// Types into a setup list's cell through the edit box, as the user does.
-void editCell(GridView *view, CellEditor *editor, int row, int column, const QString &text)
-{
-    QTest::mouseClick(view->viewport(), Qt::LeftButton, {}, view->cellRect(row, column).center());
-    QVERIFY(editor->isOpen());
-    editor->clear();
-    QTest::keyClicks(editor, text);
-    QTest::keyClick(editor, Qt::Key_Return);
-}
-
-int rowWithId(const GridModel &grid, const QString &id)
-{
-    for (int row = 1; row <= grid.rowCount(); ++row) {
-        if (grid.cellText(row, 1) == id)
-            return row;
-    }
-    return 0;
-}
 
 // veltrix-cli produce's display text of each Field, by ID.
 QHash<QString, QString> cliFigures(const QString &settings, const QString &home)
@@ -491,7 +484,7 @@ void TestMainWindow::mappingAndRatesReachTheNextProduce()
     const auto valueOf = [&](const QString &id) {
         window->selectTab(0);
         GridModel &grid = window->tabView()->grid();
-        return grid.cellText(rowWithId(grid, id), grid.columnIndex(u"value"_s));
+        return grid.cellText(findGridRow(grid, 1, id), grid.columnIndex(u"value"_s));
     };
     const QString salesBefore = valueOf(u"13"_s);
     const QString hoursBefore = valueOf(u"62"_s);
@@ -499,7 +492,7 @@ void TestMainWindow::mappingAndRatesReachTheNextProduce()
     // Panel labour sales now also take the paint labour account; panel labour costs $50 an
     // hour.
     whenModalOpens<ProgramSetupDialog>([](ProgramSetupDialog &dialog) {
-        const int row = rowWithId(dialog.setup().grid(ProgramSetup::Mapping), u"13"_s);
+        const int row = findGridRow(dialog.setup().grid(ProgramSetup::Mapping), 1, u"13"_s);
         editCell(dialog.lstA(), dialog.txtEdit(), row, 4, u" 4-1100+4-1200 "_s);
         dialog.butOK()->click();
     });

@@ -36,10 +36,9 @@ class TestPrintWindow : public QObject
 
 private Q_SLOTS:
     void init();
-    void showsThePageWithItsTitle();
     void commandsApplyTheBoxes_data();
     void commandsApplyTheBoxes();
-    void printWritesThePages();
+    void showsAndPrintsThePage();
     void closingRestoresTheUsersValues();
     void pageSetupMarginsAreUsed();
 
@@ -61,20 +60,6 @@ void TestPrintWindow::init()
     m_workspace = std::make_unique<TestWorkspace>();
     m_workspace->context().setNumberFormat(
         NumberFormat(QLocale(QLocale::English, QLocale::Australia)));
-}
-
-void TestPrintWindow::showsThePageWithItsTitle()
-{
-    PrintWindow window(m_workspace->context(), nullptr);
-    window.showPage(writePage(), u"1/7/25 to 30/6/26"_s);
-    QCOMPARE(window.windowTitle(), u"Page Preview"_s);
-    QCOMPARE(window.txtHeader()->text(), u"1/7/25 to 30/6/26"_s);
-    QVERIFY(window.chkFormatting()->isChecked());
-    QVERIFY(window.chkDate()->isChecked());
-    QVERIFY(window.chkPages()->isChecked());
-    // The mark-up in the cell is rendered, not shown as text.
-    QVERIFY(window.ieFrame()->toPlainText().contains(u"Panel labour gross"_s));
-    QCOMPARE(window.butPrint()->toolTip(), u"Prints the above grid"_s);
 }
 
 void TestPrintWindow::commandsApplyTheBoxes_data()
@@ -129,7 +114,7 @@ void TestPrintWindow::commandsApplyTheBoxes()
     QCOMPARE(seen, expected);
 }
 
-void TestPrintWindow::printWritesThePages()
+void TestPrintWindow::showsAndPrintsThePage()
 {
     const QString pdftotext = QStandardPaths::findExecutable(u"pdftotext"_s);
     if (pdftotext.isEmpty())
@@ -137,6 +122,10 @@ void TestPrintWindow::printWritesThePages()
     const QString pdf = m_workspace->path(u"printed.pdf"_s);
     PrintWindow window(m_workspace->context(), nullptr);
     window.showPage(writePage(), u"1/7/25 to 30/6/26"_s);
+    QCOMPARE(window.windowTitle(), u"Page Preview"_s);
+    QCOMPARE(window.txtHeader()->text(), u"1/7/25 to 30/6/26"_s);
+    // The mark-up in the cell is rendered, not shown as text.
+    QVERIFY(window.ieFrame()->toPlainText().contains(u"Panel labour gross"_s));
     window.setPrintQuestion([&](QPrinter &printer, QWidget *) {
         printer.setOutputFormat(QPrinter::PdfFormat);
         printer.setOutputFileName(pdf);
