@@ -27,7 +27,6 @@ private Q_SLOTS:
     void passwordOutsideTheCodePageIsRefused();
     void pathEndingInSlashIsKept();
     void unknownPackageIsWrittenBackAsItWas();
-    void emptyStoreLoadsEmptyValues();
     void fileFilters();
 };
 
@@ -157,16 +156,6 @@ void TestSystemConfiguration::unknownPackageIsWrittenBackAsItWas()
     QVERIFY(configuration.save(values));
     QCOMPARE(workspace.store().readSetting(u"AccPackage"_s), u"myob"_s);
     QCOMPARE(loadSettings(workspace.context()), u"Your accounting package must be specified!"_s);
-}
-
-void TestSystemConfiguration::emptyStoreLoadsEmptyValues()
-{
-    TestWorkspace workspace;
-    const SystemConfiguration::Values values =
-        SystemConfiguration(workspace.store(), workspace.prompter()).load();
-    QCOMPARE(values.dbPath, QString());
-    QCOMPARE(values.package, QString());
-    QCOMPARE(values.password, QString());
 }
 
 void TestSystemConfiguration::fileFilters()

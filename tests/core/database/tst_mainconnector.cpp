@@ -38,8 +38,6 @@ private Q_SLOTS:
     void cleanup();
     void versionRule_data();
     void versionRule();
-    void versionsFromTheDatabase_data();
-    void versionsFromTheDatabase();
     void opensTheStandingRecordsets();
     void cacheFile_data();
     void cacheFile();
@@ -96,28 +94,6 @@ void TestMainConnector::versionRule()
     const NumberFormat germany(QLocale(QLocale::German, QLocale::Germany));
     QCOMPARE(checkVersions(required, database, u"1.55"_s, australia), expected);
     QCOMPARE(checkVersions(required, database, u"1.55"_s, germany), expected);
-}
-
-void TestMainConnector::versionsFromTheDatabase_data()
-{
-    QTest::addColumn<QString>("required");
-    QTest::addColumn<QString>("database");
-    QTest::addColumn<QString>("expected");
-    // The rule itself is versionRule's; these show the connection reads both rows.
-    QTest::newRow("needs a newer program") << u"1.6"_s << u"1.55"_s << UpdateProgram;
-    QTest::newRow("old database") << u"1.5"_s << u"1.4"_s << UpdateDatabase;
-}
-
-void TestMainConnector::versionsFromTheDatabase()
-{
-    QFETCH(QString, required);
-    QFETCH(QString, database);
-    QFETCH(QString, expected);
-    QCOMPARE(loadSettings(context()), QString());
-    QVERIFY(m_workspace->setConfigRow(ConfigValues::RequiredVersion, required));
-    QVERIFY(m_workspace->setConfigRow(ConfigValues::DatabaseVersion, database));
-    QCOMPARE(connectMainDatabase(context()), expected);
-    QCOMPARE(context().mainDatabase().databaseVersion(), database);
 }
 
 void TestMainConnector::opensTheStandingRecordsets()

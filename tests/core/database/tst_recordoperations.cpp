@@ -79,7 +79,6 @@ void TestRecordOperations::findRecordById_data()
     QTest::addColumn<qint64>("id");
     QTest::addColumn<bool>("found");
     QTest::newRow("first") << qint64(1) << true;
-    QTest::newRow("last") << qint64(2) << true;
     QTest::newRow("missing") << qint64(3) << false;
     QTest::newRow("negative") << qint64(-1) << false;
 }
@@ -141,10 +140,8 @@ void TestRecordOperations::valueExists_data()
     QTest::newRow("other case") << u"Bob"_s << u"bob"_s << true;
     QTest::newRow("different") << u"Bob"_s << u"Rob"_s << false;
     QTest::newRow("apostrophe") << u"O'Brien"_s << u"o'brien"_s << true;
-    QTest::newRow("apostrophe, not there") << u"OBrien"_s << u"O'Brien"_s << false;
     QTest::newRow("percent is a character") << u"Bob"_s << u"B%"_s << false;
     QTest::newRow("underscore is a character") << u"Bob"_s << u"B_b"_s << false;
-    QTest::newRow("stored underscore") << u"ops_1"_s << u"OPS_1"_s << true;
     QTest::newRow("stored backslash") << u"a\\b"_s << u"A\\B"_s << true;
     QTest::newRow("quote and semicolon") << u"Bob"_s << u"x'; DROP TABLE Users; --"_s << false;
 }

@@ -76,9 +76,9 @@ private Q_SLOTS:
     void firstProduceOpensTheCompanyFile();
     void invalidRangeIsRefused_data();
     void invalidRangeIsRefused();
+    void noSourceAndNoFile_data();
     void noSourceAndNoFile();
     void unreadableCompanyFileIsReported();
-    void moneyWorksWithoutDocumentOrFile();
     void anotherCopysSetupReachesTheNextProduceWhole();
 
 private:
@@ -176,17 +176,27 @@ void TestProduceCommand::invalidRangeIsRefused()
     QCOMPARE(m_workspace->store().readSetting(u"M1"_s), QString());
 }
 
+void TestProduceCommand::noSourceAndNoFile_data()
+{
+    QTest::addColumn<QString>("package");
+    QTest::newRow("MYOB") << u"MYOB"_s;
+    QTest::newRow("MoneyWorks") << u"MoneyWorks"_s;
+}
+
 void TestProduceCommand::noSourceAndNoFile()
 {
+    QFETCH(QString, package);
+    m_workspace->store().writeSetting(u"AccPackage"_s, package);
     m_workspace->store().writeSetting(u"AccFilePath"_s, QString());
     QVERIFY(m_workspace->connect());
     QCOMPARE(ProduceCommand(m_workspace->context()).produce({1, 2008, 1, 2008}), Outcome::NoSource);
     const RecordingPrompter::Message &message = m_workspace->prompter().messages().last();
     QCOMPARE(message.title, u"Cannot Produce KPI's"_s);
     QCOMPARE(message.text,
-             u"There is no running instance of MYOB and your primary Account data file has not "
-             u"been specified!\r\n\r\nYou can specify your primary Accounting file in the "
-             u"System Configuration."_s);
+             u"There is no running instance of "_s + package +
+                 u" and your primary Account data file has not been specified!\r\n\r\n"
+                 u"You can specify your primary Accounting file in the System "
+                 u"Configuration."_s);
 }
 
 void TestProduceCommand::unreadableCompanyFileIsReported()
@@ -198,17 +208,6 @@ void TestProduceCommand::unreadableCompanyFileIsReported()
     QCOMPARE(m_workspace->prompter().messages().size(), 1);
     QVERIFY(m_workspace->prompter().messages().first().title.startsWith(u"Produce Error "_s));
     QVERIFY(!m_workspace->prompter().isBusy());
-}
-
-void TestProduceCommand::moneyWorksWithoutDocumentOrFile()
-{
-    m_workspace->store().writeSetting(u"AccPackage"_s, u"MoneyWorks"_s);
-    m_workspace->store().writeSetting(u"AccFilePath"_s, QString());
-    QVERIFY(m_workspace->connect());
-    QCOMPARE(ProduceCommand(m_workspace->context()).produce({1, 2008, 1, 2008}), Outcome::NoSource);
-    QVERIFY(m_workspace->prompter().messages().last().text.startsWith(
-        u"There is no running instance of MoneyWorks and your primary Account data file has not "
-        u"been specified!"_s));
 }
 
 void TestProduceCommand::anotherCopysSetupReachesTheNextProduceWhole()

@@ -7,86 +7,9 @@
 #include <QTemporaryDir>
 #include <QTest>
 
-#include <map>
-#include <string>
-
 using namespace Qt::StringLiterals;
 
 namespace {
-
-// A plain, slow encoder written straight from the file format: strings keyed by their
-// three-digit pixel numbers, codes packed bit by bit into a 256-byte sub-block buffer.
-class ReferenceEncoder
-{
-public:
-    QByteArray imageData(const std::vector<std::vector<int>> &rows)
-    {
-        m_out.clear();
-        m_buffer.fill(0);
-        m_bitPosition = 8;
-        for (const std::vector<int> &row : rows) {
-            m_strings.clear();
-            writeCode(256);
-            std::string current = key(row[0]);
-            int code = row[0];
-            for (size_t k = 1; k < row.size(); ++k) {
-                const std::string longer = current + key(row[k]);
-                if (auto it = m_strings.find(longer); it != m_strings.end()) {
-                    current = longer;
-                    code = it->second;
-                    continue;
-                }
-                writeCode(code);
-                if (m_strings.size() >= 253) {
-                    writeCode(256);
-                    m_strings.clear();
-                } else {
-                    const int next = 258 + int(m_strings.size());
-                    m_strings[longer] = next;
-                }
-                current = key(row[k]);
-                code = row[k];
-            }
-            writeCode(code);
-        }
-        writeCode(257);
-        m_out.append(char(m_buffer[0]));
-        m_out.append(reinterpret_cast<const char *>(m_buffer.data()) + 1, m_buffer[0]);
-        return m_out;
-    }
-
-private:
-    static std::string key(int pixel)
-    {
-        char text[4];
-        std::snprintf(text, sizeof text, "%03d", pixel);
-        return text;
-    }
-
-    void writeCode(int code)
-    {
-        for (int i = 0; i < 9; ++i) {
-            if (m_bitPosition == 8) {
-                if (m_buffer[0] == 255) {
-                    m_out.append(reinterpret_cast<const char *>(m_buffer.data()), 256);
-                    m_buffer[0] = 1;
-                } else {
-                    ++m_buffer[0];
-                }
-                m_buffer[m_buffer[0]] = 0;
-                m_bitPosition = 0;
-            }
-            if (code & (1 << i))
-                m_buffer[m_buffer[0]] |= quint8(1 << m_bitPosition);
-            ++m_bitPosition;
-        }
-    }
-
-    QByteArray m_out;
-    std::array<quint8, 256> m_buffer{};
-    int m_bitPosition = 8;
-    std::map<std::string, int> m_strings;
-};
 
 qsizetype imageDataOffset(const QByteArray &gif)
 {
@@ -116,21 +39,6 @@ QList<int> codesOf(const QByteArray &gif)
             break;
     }
     return codes;
-}
-
-std::vector<std::vector<int>> indexRows(const QImage &image)
-{
-    std::vector<std::vector<int>> rows;
-    for (int y = 0; y < image.height(); ++y) {
-        std::vector<int> row;
-        for (int x = 0; x < image.width(); ++x) {
-            row.push_back(image.format() == QImage::Format_Indexed8
-                              ? image.pixelIndex(x, y)
-                              : GifEncoder::nearestCubeIndex(image.pixel(x, y)));
-        }
-        rows.push_back(row);
-    }
-    return rows;
 }
 
 QImage randomImage(QRandomGenerator &random, int width, int height, bool indexed)
@@ -191,8 +99,8 @@ private Q_SLOTS:
     void fileLayout();
     void progressEveryTenRows_data();
     void progressEveryTenRows();
-    void matchesReferenceAndDecodes_data();
-    void matchesReferenceAndDecodes();
+    void decodesThroughQt_data();
+    void decodesThroughQt();
     void saveGif();
 };
 
@@ -328,7 +236,7 @@ void TestGifEncoder::progressEveryTenRows()
     QCOMPARE(seen, reports);
 }
 
-void TestGifEncoder::matchesReferenceAndDecodes_data()
+void TestGifEncoder::decodesThroughQt_data()
 {
     QTest::addColumn<int>("width");
     QTest::addColumn<int>("height");
@@ -342,7 +250,7 @@ void TestGifEncoder::matchesReferenceAndDecodes_data()
     QTest::newRow("333x60 indexed") << 333 << 60 << true << true;
 }
 
-void TestGifEncoder::matchesReferenceAndDecodes()
+void TestGifEncoder::decodesThroughQt()
 {
     QFETCH(int, width);
     QFETCH(int, height);
@@ -355,10 +263,6 @@ void TestGifEncoder::matchesReferenceAndDecodes()
         const std::optional<QRgb> key =
             transparent ? std::optional<QRgb>(image.pixel(0, 0)) : std::nullopt;
         const QByteArray gif = encoder.encode(image, key).value();
-
-        const QByteArray data =
-            gif.mid(imageDataOffset(gif), gif.size() - 2 - imageDataOffset(gif));
-        QCOMPARE(data, ReferenceEncoder().imageData(indexRows(image)));
 
         const QImage decoded = decodeWithQt(gif);
         QCOMPARE(decoded.size(), image.size());

@@ -28,18 +28,14 @@ class ScriptedLink : public MoneyWorksLink
 {
 public:
     QHash<QString, Answer> answers;
-    QStringList asked;
 
     Answer evaluate(const QString &expression) override
     {
-        asked << expression;
         return answers.value(expression, Answer{u"[ERROR] Unknown"_s, std::nullopt});
     }
     std::optional<DbError> openDocument(const QString &) override { return std::nullopt; }
-    std::optional<DbError> exportRecords(const QString &, const QString &search,
-                                         const QString &) override
+    std::optional<DbError> exportRecords(const QString &, const QString &, const QString &) override
     {
-        asked << search;
         return std::nullopt;
     }
 };
@@ -78,17 +74,14 @@ private Q_SLOTS:
     void countJobReferences();
     void answersThatAreNotNumbers_data();
     void answersThatAreNotNumbers();
-    void movementsThroughTheServer();
-    void jobsThroughTheServer();
-    void serverAnswersAsDocumented_data();
-    void serverAnswersAsDocumented();
+    void figuresThroughTheServer();
     void periodEnd_data();
     void periodEnd();
-    void wrongCredentials();
-    void serverThatDoesNotAnswer();
+    void openingIsRefused_data();
+    void openingIsRefused();
+    void lateAnswersTimeOut();
     void serverThatAnswersNonsense_data();
     void serverThatAnswersNonsense();
-    void addressThatIsNoDocument();
 
 private:
     std::unique_ptr<MoneyWorksSource> sourceFor(ScriptedLink *&link);
@@ -218,7 +211,7 @@ void TestMoneyWorksSource::answersThatAreNotNumbers()
     QCOMPARE(m_prompter.messages().size(), reported ? 1 : 0);
 }
 
-void TestMoneyWorksSource::movementsThroughTheServer()
+void TestMoneyWorksSource::figuresThroughTheServer()
 {
     auto source = serverSource(u"Admin"_s, u"s3cret"_s, m_simulator.port());
     m_prompter.clearMessages();
@@ -232,15 +225,7 @@ void TestMoneyWorksSource::movementsThroughTheServer()
     QCOMPARE(source->accountMovement(u"5-1100"_s, first, last), 400.25);
     QCOMPARE(source->accountMovement(u"9-9999"_s, first, last), 0.0);
     QCOMPARE(source->accountMovement(u"4\"1100"_s, first, last), 0.0);
-    QVERIFY(m_prompter.messages().isEmpty());
-}
-
-void TestMoneyWorksSource::jobsThroughTheServer()
-{
-    auto source = serverSource(u"Admin"_s, u"s3cret"_s, m_simulator.port());
-    QCOMPARE(source->openDataFile(), std::nullopt);
-    m_prompter.clearMessages();
-    QCOMPARE(source->jobsCount(QDate(2025, 7, 1), QDate(2025, 7, 31)), qint16(5));
+    QCOMPARE(source->jobsCount(first, last), qint16(5));
     QCOMPARE(source->jobsCount(QDate(2025, 7, 2), QDate(2025, 7, 3)), qint16(2));
     QCOMPARE(source->jobsCount(QDate(2024, 1, 1), QDate(2024, 1, 31)), qint16(0));
     QVERIFY(m_prompter.messages().isEmpty());
@@ -248,46 +233,6 @@ void TestMoneyWorksSource::jobsThroughTheServer()
     QFile jobs(source->jobsFile());
     QVERIFY(jobs.open(QIODevice::ReadOnly));
     QCOMPARE(jobs.readAll(), QByteArray("theirref\tu.detail.account\r\n"));
-}
-
-void TestMoneyWorksSource::serverAnswersAsDocumented_data()
-{
-    QTest::addColumn<QByteArray>("path");
-    QTest::addColumn<bool>("login");
-    QTest::addColumn<QByteArray>("answer");
-    const QByteArray document = "/REST/" + QUrl::toPercentEncoding(Document);
-    const QByteArray search = QUrl::toPercentEncoding(u"type = `DI@` and transdate >= '2/7/25' "
-                                                      u"and transdate <= '2/7/25'"_s);
-    QTest::newRow("version, no login needed")
-        << QByteArray("/REST//version") << false << QByteArray("200 OK\r\n9.2");
-    QTest::newRow("export through a template: records only, ended as the template ends them")
-        << document + "/export/table=transaction&search=" + search +
-               "&format=%5BTheirRef%5D%3B%5BDetail.Account%5D%0A"
-        << true << QByteArray("200 OK\r\nRO2;4-1100\nRO2;4-1400\n");
-    QTest::newRow("export without a template")
-        << document + "/export/table=transaction&search=" + search << true
-        << QByteArray("400 Bad Request");
-}
-
-void TestMoneyWorksSource::serverAnswersAsDocumented()
-{
-    QFETCH(QByteArray, path);
-    QFETCH(bool, login);
-    QFETCH(QByteArray, answer);
-    QTcpSocket socket;
-    socket.connectToHost(QHostAddress::LocalHost, quint16(m_simulator.port()));
-    QVERIFY(socket.waitForConnected(5000));
-    socket.write("GET " + path + " HTTP/1.1\r\n" +
-                 (login ? "Authorization: Basic " + QByteArray("Admin:s3cret").toBase64() + "\r\n"
-                        : QByteArray()) +
-                 "\r\n");
-    QByteArray response;
-    while (socket.waitForReadyRead(5000))
-        response += socket.readAll();
-    const qsizetype bodyStart = response.indexOf("\r\n\r\n");
-    const QByteArray status = response.left(response.indexOf("\r\n")).mid(9);
-    QCOMPARE(answer.startsWith("200") ? status + "\r\n" + response.mid(bodyStart + 4) : status,
-             answer);
 }
 
 void TestMoneyWorksSource::periodEnd_data()
@@ -332,26 +277,38 @@ void TestMoneyWorksSource::periodEnd()
     QVERIFY(data.getFieldValue(97) >= 5.0);
 }
 
-void TestMoneyWorksSource::wrongCredentials()
+void TestMoneyWorksSource::openingIsRefused_data()
 {
-    auto source = serverSource(u"Admin"_s, u"wrong"_s, m_simulator.port());
-    const std::optional<DbError> error = source->openDataFile();
-    QVERIFY(error);
-    QCOMPARE(error->number, 401);
+    QTest::addColumn<QString>("address");
+    QTest::addColumn<QString>("password");
+    QTest::addColumn<int>("error");
+    const QString server = m_simulator.address(Document);
+    QTest::newRow("wrong password") << server << u"wrong"_s << 401;
+    QTest::newRow("no document in the address")
+        << u"/books/Acme.moneyworks"_s << u"s3cret"_s << RestMoneyWorksLink::NotADocumentError;
+    // A server that takes connections and says nothing.
+    QTest::newRow("silent server") << QString() << u"s3cret"_s << RestMoneyWorksLink::TimeoutError;
+}
+
+void TestMoneyWorksSource::openingIsRefused()
+{
+    QFETCH(QString, address);
+    QFETCH(QString, password);
+    QFETCH(int, error);
+    QTcpServer silent;
+    QVERIFY(silent.listen(QHostAddress::LocalHost));
+    auto source =
+        serverSource(u"Admin"_s, password, silent.serverPort(), address.isEmpty() ? 1 : 15);
+    if (!address.isEmpty())
+        m_settings.accFilePath = address;
+    const std::optional<DbError> opened = source->openDataFile();
+    QVERIFY(opened);
+    QCOMPARE(opened->number, error);
     QVERIFY(!source->isReachable());
 }
 
-void TestMoneyWorksSource::serverThatDoesNotAnswer()
+void TestMoneyWorksSource::lateAnswersTimeOut()
 {
-    // A server that takes connections and says nothing.
-    QTcpServer silent;
-    QVERIFY(silent.listen(QHostAddress::LocalHost));
-    auto source = serverSource(u"Admin"_s, u"s3cret"_s, silent.serverPort(), 1);
-    m_prompter.clearMessages();
-    const std::optional<DbError> error = source->openDataFile();
-    QVERIFY(error);
-    QCOMPARE(error->number, RestMoneyWorksLink::TimeoutError);
-
     // Once open (the answers arrive late, not never), every code reports its own timeout.
     SimulatorProcess slow;
     QVERIFY2(slow.start({u"--ledger"_s, m_ledger, u"--document"_s, Document, u"--delay-ms"_s,
@@ -415,17 +372,6 @@ void TestMoneyWorksSource::serverThatAnswersNonsense()
     }
     QCOMPARE(shown, titles);
     QVERIFY(!QFile::exists(source->jobsFile()));
-}
-
-void TestMoneyWorksSource::addressThatIsNoDocument()
-{
-    m_settings.accFilePath = u"/books/Acme.moneyworks"_s;
-    MoneyWorksSource source(m_settings, m_prompter, m_numbers, [] {
-        return std::make_unique<RestMoneyWorksLink>(QString(), QString(), 15);
-    });
-    const std::optional<DbError> error = source.openDataFile();
-    QVERIFY(error);
-    QCOMPARE(error->number, RestMoneyWorksLink::NotADocumentError);
 }
 
 QTEST_GUILESS_MAIN(TestMoneyWorksSource)
