@@ -31,6 +31,8 @@ public:
 
 private:
     std::optional<DbError> execute(const QString &sql);
+    std::optional<DbError> execute(const QStringList &statements);
+    std::optional<DbError> executeOnce(const QStringList &statements);
 
     MainDatabase &m_database;
 };
