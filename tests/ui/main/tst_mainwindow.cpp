@@ -5,8 +5,6 @@
 #include "testworkspace.h"
 
 #include "app/demoworkspace.h"
-#include "app/mainconnector.h"
-#include "app/settingsloader.h"
 #include "common/fileoperations.h"
 #include "database/configvalues.h"
 #include "grid/gridmodel.h"
@@ -46,9 +44,7 @@ class TestMainWindow : public QObject
 private Q_SLOTS:
     void init();
     void cleanup();
-    void builtInAccountWithNoUsers();
-    void stepButtons_data();
-    void stepButtons();
+    void builtInAccountWithNoUsersAndStepButtons();
     void yearIsCheckedBeforeUse_data();
     void yearIsCheckedBeforeUse();
     void resetCounterLogsEveryWindowOff();
@@ -106,7 +102,7 @@ void TestMainWindow::cleanup()
     m_workspace.reset();
 }
 
-void TestMainWindow::builtInAccountWithNoUsers()
+void TestMainWindow::builtInAccountWithNoUsersAndStepButtons()
 {
     auto window = openWindow(*m_workspace);
     QVERIFY(window);
@@ -119,49 +115,25 @@ void TestMainWindow::builtInAccountWithNoUsers()
     QCOMPARE(window->lstCompareType()->itemText(0), u"Year"_s); // "The Past 1 Year"
     window->lstCompareCount()->setCurrentIndex(1);
     QCOMPARE(window->lstCompareType()->itemText(1), u"Periods"_s);
-}
 
-void TestMainWindow::stepButtons_data()
-{
-    QTest::addColumn<QString>("button");
-    QTest::addColumn<QStringList>("from"); // month index, year, month index, year
-    QTest::addColumn<QStringList>("to");   // empty: "Limit Reached"
-    QTest::newRow("previous month")
-        << u"previous month"_s << QStringList{u"2"_s, u"2005"_s, u"5"_s, u"2005"_s}
-        << QStringList{u"1"_s, u"2005"_s, u"1"_s, u"2005"_s};
-    QTest::newRow("previous month from January 1950")
-        << u"previous month"_s << QStringList{u"0"_s, u"1950"_s, u"0"_s, u"1950"_s}
-        << QStringList();
-    QTest::newRow("previous year")
-        << u"previous year"_s << QStringList{u"6"_s, u"2004"_s, u"5"_s, u"2005"_s}
-        << QStringList{u"6"_s, u"2003"_s, u"5"_s, u"2004"_s};
-}
-
-void TestMainWindow::stepButtons()
-{
-    QFETCH(QString, button);
-    QFETCH(QStringList, from);
-    QFETCH(QStringList, to);
-    auto window = openWindow(*m_workspace);
-    QVERIFY(window);
-    window->lstMonth1()->setCurrentIndex(from[0].toInt());
-    window->lstYear1()->setEditText(from[1]);
-    window->lstMonth2()->setCurrentIndex(from[2].toInt());
-    window->lstYear2()->setEditText(from[3]);
+    const auto select = [&](int month1, const QString &year1, int month2, const QString &year2) {
+        window->lstMonth1()->setCurrentIndex(month1);
+        window->lstYear1()->setEditText(year1);
+        window->lstMonth2()->setCurrentIndex(month2);
+        window->lstYear2()->setEditText(year2);
+    };
+    select(6, u"2004"_s, 5, u"2005"_s);
+    window->stepPreviousYear();
+    QCOMPARE(window->lstMonth1()->currentIndex(), 6);
+    QCOMPARE(window->lstYear1()->currentText(), u"2003"_s);
+    QCOMPARE(window->lstMonth2()->currentIndex(), 5);
+    QCOMPARE(window->lstYear2()->currentText(), u"2004"_s);
+    // No step goes back beyond January 1950.
+    select(0, u"1950"_s, 0, u"1950"_s);
     m_workspace->prompter().clearMessages();
-    if (button == u"previous month"_s)
-        window->stepPreviousMonth();
-    else
-        window->stepPreviousYear();
-    if (to.isEmpty()) {
-        QCOMPARE(m_workspace->prompter().messages().first().title, u"Limit Reached"_s);
-        QCOMPARE(window->lstYear1()->currentText(), from[1]);
-        return;
-    }
-    QCOMPARE(QString::number(window->lstMonth1()->currentIndex()), to[0]);
-    QCOMPARE(window->lstYear1()->currentText(), to[1]);
-    QCOMPARE(QString::number(window->lstMonth2()->currentIndex()), to[2]);
-    QCOMPARE(window->lstYear2()->currentText(), to[3]);
+    window->stepPreviousMonth();
+    QCOMPARE(m_workspace->prompter().messages().first().title, u"Limit Reached"_s);
+    QCOMPARE(window->lstYear1()->currentText(), u"1950"_s);
 }
 
 void TestMainWindow::yearIsCheckedBeforeUse_data()
