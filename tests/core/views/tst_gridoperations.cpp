@@ -33,9 +33,7 @@ private Q_SLOTS:
     void formatSetupList();
     void fitColumn_data();
     void fitColumn();
-    void selectRowById_data();
-    void selectRowById();
-    void findGridRowIgnoresCase();
+    void rowsAreFoundByIdOrText();
     void cellStyles();
     void redrawSuspensionAnnouncesOnce();
 };
@@ -131,36 +129,25 @@ void TestGridOperations::fitColumn()
     QCOMPARE(grid.column(4).width, width);
 }
 
-void TestGridOperations::selectRowById_data()
+void TestGridOperations::rowsAreFoundByIdOrText()
 {
-    QTest::addColumn<qint64>("id");
-    QTest::addColumn<int>("row");
-    QTest::newRow("found") << qint64(7) << 2;
-    QTest::newRow("not there") << qint64(99) << 1;
-    QTest::newRow("zero") << qint64(0) << 1;
-}
-
-void TestGridOperations::selectRowById()
-{
-    QFETCH(qint64, id);
-    QFETCH(int, row);
     GridModel grid;
     grid.addColumn(u"id"_s, QString(), 0, 10, true);
+    grid.addColumn(u"name"_s, QString(), 0, 10, true);
     GridOperations::selectRowById(grid, 1); // no rows: nothing happens
     QCOMPARE(grid.selectedRow(), 0);
-    addRows(grid, {{u"3"_s}, {u"7"_s}});
-    GridOperations::selectRowById(grid, id);
-    QCOMPARE(grid.selectedRow(), row);
-}
-
-void TestGridOperations::findGridRowIgnoresCase()
-{
-    GridModel grid;
-    grid.addColumn(u"name"_s, QString(), 0, 10, true);
-    QCOMPARE(findGridRow(grid, 1, u"x"_s), 0);
-    addRows(grid, {{u"Anna"_s}, {u"BOB"_s}, {u"bob"_s}});
-    QCOMPARE(findGridRow(grid, 1, u"bob"_s), 2);
-    QCOMPARE(findGridRow(grid, 1, u"carl"_s), 0);
+    QCOMPARE(findGridRow(grid, 2, u"x"_s), 0);
+    addRows(grid, {{u"3"_s, u"Anna"_s}, {u"7"_s, u"BOB"_s}, {u"9"_s, u"bob"_s}});
+    GridOperations::selectRowById(grid, 7);
+    QCOMPARE(grid.selectedRow(), 2);
+    // An ID not listed, or none, selects the first row.
+    for (const qint64 id : {qint64(99), qint64(0)}) {
+        grid.setSelectedRow(3);
+        GridOperations::selectRowById(grid, id);
+        QCOMPARE(grid.selectedRow(), 1);
+    }
+    QCOMPARE(findGridRow(grid, 2, u"bob"_s), 2); // the first, whatever its case
+    QCOMPARE(findGridRow(grid, 2, u"carl"_s), 0);
 }
 
 void TestGridOperations::cellStyles()
