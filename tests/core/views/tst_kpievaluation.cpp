@@ -20,7 +20,6 @@ private Q_SLOTS:
     void nothingToEvaluateKeepsTheCallersValues();
     void wrongSignIsShownAndPoor_data();
     void wrongSignIsShownAndPoor();
-    void benchmarkCell();
     void comparisonRanges_data();
     void comparisonRanges();
 
@@ -110,13 +109,6 @@ void TestKpiEvaluation::wrongSignIsShownAndPoor()
     QCOMPARE(UsualSign::shown(field, value), shown);
     QCOMPARE(UsualSign::isUnusual(field, value), shown < 0);
     QCOMPARE(int(evaluateField(field, benchmark, value, m_numbers).band), band);
-}
-
-void TestKpiEvaluation::benchmarkCell()
-{
-    QCOMPARE(benchmarkCellText(u">45,<35"_s), u">45%"_s);
-    QCOMPARE(benchmarkCellText(u"<30"_s), u"<30%"_s);
-    QCOMPARE(benchmarkCellText(QString()), QString());
 }
 
 void TestKpiEvaluation::comparisonRanges_data()
