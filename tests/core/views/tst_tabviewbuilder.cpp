@@ -164,10 +164,6 @@ void TestTabViewBuilder::usersSeeTheirLines_data()
     QTest::addColumn<QString>("fields");
     QTest::addColumn<bool>("produced");
     QTest::addColumn<QList<qint64>>("visible"); // empty: every row
-    QTest::newRow("built-in account sees everything")
-        << u"sysop"_s << QString() << true << QList<qint64>();
-    QTest::newRow("nothing allowed: headings only")
-        << u"bob"_s << u"#"_s << true << QList<qint64>{12, 20, 29};
     QTest::newRow("two groups, one ID twice")
         << u"bob"_s << u"13,16#16"_s << true << QList<qint64>{12, 13, 16, 20, 29};
     QTest::newRow("nothing produced: every row") << u"bob"_s << u"#"_s << false << QList<qint64>();
