@@ -47,10 +47,9 @@ private Q_SLOTS:
     void builtInAccountWithNoUsersAndStepButtons();
     void yearIsCheckedBeforeUse_data();
     void yearIsCheckedBeforeUse();
-    void resetCounterLogsEveryWindowOff();
     void clockFormat();
     void typeAheadCompletesNames();
-    void shutdownRequestEndsTheProgramUnderADialog();
+    void networkRequestsReachThisCopy();
     void produceShowsTheDemoFigures();
     void nextUserSeesNothingOfTheLast();
     void loginFollowsTheAccount_data();
@@ -214,35 +213,12 @@ void TestMainWindow::typeAheadCompletesNames()
     QCOMPARE(box->text(), u"J"_s);
 }
 
-void TestMainWindow::shutdownRequestEndsTheProgramUnderADialog()
+void TestMainWindow::networkRequestsReachThisCopy()
 {
     auto window = openWindow(*m_workspace);
     QVERIFY(window);
     window->show();
     QVERIFY(QTest::qWaitForWindowExposed(window.get()));
-    QDialog dialog(window.get());
-    bool ended = false;
-    window->setProgramEnd([&] {
-        ended = true;
-        dialog.reject();
-    });
-    QCOMPARE(ConfigValues(m_workspace->context().mainDatabase(), m_workspace->prompter())
-                 .setConfigValue(5, u"Shutdown"_s),
-             std::nullopt);
-    // The poll comes while the dialog runs its own event loop.
-    QTimer::singleShot(0, window.get(), &MainWindow::pollUsers);
-    QTimer::singleShot(10000, &dialog, &QDialog::reject);
-    dialog.exec();
-    QVERIFY(ended);
-    QVERIFY(!window->isVisible());
-    // Shut down in order: the database is closed.
-    QVERIFY(!m_workspace->context().mainDatabase().isConnected());
-}
-
-void TestMainWindow::resetCounterLogsEveryWindowOff()
-{
-    auto window = openWindow(*m_workspace);
-    QVERIFY(window);
     addUser(*m_workspace, u"bob"_s);
     window->login(u"bob"_s, u"pw"_s);
     const ConfigValues config(m_workspace->context().mainDatabase(), m_workspace->prompter());
@@ -262,6 +238,24 @@ void TestMainWindow::resetCounterLogsEveryWindowOff()
     m_workspace->prompter().setWhileShown({});
     QVERIFY(!m_workspace->context().loginState().loggedIn);
     QCOMPARE(config.getConfigValue(4), u"0"_s);
+
+    // A shutdown request ends the program, even while a dialog runs its own event loop.
+    QDialog dialog(window.get());
+    bool ended = false;
+    window->setProgramEnd([&] {
+        ended = true;
+        dialog.reject();
+    });
+    QCOMPARE(ConfigValues(m_workspace->context().mainDatabase(), m_workspace->prompter())
+                 .setConfigValue(5, u"Shutdown"_s),
+             std::nullopt);
+    QTimer::singleShot(0, window.get(), &MainWindow::pollUsers);
+    QTimer::singleShot(10000, &dialog, &QDialog::reject);
+    dialog.exec();
+    QVERIFY(ended);
+    QVERIFY(!window->isVisible());
+    // Shut down in order: the database is closed.
+    QVERIFY(!m_workspace->context().mainDatabase().isConnected());
 }
 
 void TestMainWindow::produceShowsTheDemoFigures()
