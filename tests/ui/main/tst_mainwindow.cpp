@@ -48,8 +48,7 @@ private Q_SLOTS:
     void yearIsCheckedBeforeUse_data();
     void yearIsCheckedBeforeUse();
     void clockFormat();
-    void typeAheadCompletesNames();
-    void networkRequestsReachThisCopy();
+    void typeAheadThenNetworkRequests();
     void produceShowsTheFiguresAndTheNextUserNothingOfThem();
     void loginFollowsTheAccount_data();
     void loginFollowsTheAccount();
@@ -193,11 +192,11 @@ void TestMainWindow::clockFormat()
              u"Tuesday, 1 Sep 2026 12:07 AM"_s);
 }
 
-void TestMainWindow::typeAheadCompletesNames()
+void TestMainWindow::typeAheadThenNetworkRequests()
 {
     QVERIFY(connectWorkspace(*m_workspace));
     addUser(*m_workspace, u"Anna"_s);
-    addUser(*m_workspace, u"John"_s);
+    addUser(*m_workspace, u"Bob"_s);
     auto window = openWindow(*m_workspace);
     QVERIFY(window);
     window->show();
@@ -205,20 +204,13 @@ void TestMainWindow::typeAheadCompletesNames()
     QLineEdit *box = window->lstUsers()->lineEdit();
     box->clear();
     box->setFocus();
-    QTest::keyClick(box, Qt::Key_J);
-    QCOMPARE(box->text(), u"John"_s);
-    QCOMPARE(box->selectedText(), u"ohn"_s);
+    QTest::keyClick(box, Qt::Key_B);
+    QCOMPARE(box->text(), u"Bob"_s);
+    QCOMPARE(box->selectedText(), u"ob"_s);
     QTest::keyClick(box, Qt::Key_Backspace);
-    QCOMPARE(box->text(), u"J"_s);
-}
+    QCOMPARE(box->text(), u"B"_s);
 
-void TestMainWindow::networkRequestsReachThisCopy()
-{
-    auto window = openWindow(*m_workspace);
-    QVERIFY(window);
-    window->show();
-    QVERIFY(QTest::qWaitForWindowExposed(window.get()));
-    addUser(*m_workspace, u"bob"_s);
+    // A counter reset asks every copy to log off, this one too.
     window->login(u"bob"_s, u"pw"_s);
     const ConfigValues config(m_workspace->context().mainDatabase(), m_workspace->prompter());
     bool withdrawnWhileOpen = false;
