@@ -26,9 +26,8 @@ class TestAppWindows : public QObject
 private Q_SLOTS:
     void configShowsTheStoredSettingsAndKeepsTheLogin();
     void configBrowsesAndRefusesAMissingFolder();
-    void loadingOffersTheUpdate();
     void loadingFailsThenOffersOptions();
-    void loadingHandsOverAndAboutShowsBothVersions();
+    void loadingOffersTheUpdateOrHandsOver();
     void placementIsRestored();
 };
 
@@ -97,22 +96,6 @@ void TestAppWindows::configBrowsesAndRefusesAMissingFolder()
     QCOMPARE(workspace.prompter().messages().first().title, u"Invalid Folder Path"_s);
 }
 
-void TestAppWindows::loadingOffersTheUpdate()
-{
-    TestWorkspace workspace;
-    QVERIFY(workspace.configure());
-    QVERIFY(workspace.setConfigRow(1, u"1.4"_s));
-    LoadingWindow window(workspace.context(), workspace.prompter());
-    window.show();
-    QVERIFY(QTest::qWaitForWindowExposed(&window));
-    window.runSequence();
-    QCOMPARE(window.lblStatus()->text(),
-             u"You must update the database to work with this version of Veltrix!"_s);
-    QVERIFY(window.butOptions()->isHidden());
-    QCOMPARE(window.focusWidget(), window.butUpdate());
-    QVERIFY(!workspace.context().mainDatabase().isConnected());
-}
-
 void TestAppWindows::loadingFailsThenOffersOptions()
 {
     TestWorkspace workspace;
@@ -161,10 +144,25 @@ void TestAppWindows::loadingFailsThenOffersOptions()
     QTRY_COMPARE(handedOver.count(), 1);
 }
 
-void TestAppWindows::loadingHandsOverAndAboutShowsBothVersions()
+void TestAppWindows::loadingOffersTheUpdateOrHandsOver()
 {
     TestWorkspace workspace;
     QVERIFY(workspace.configure());
+    QVERIFY(workspace.setConfigRow(1, u"1.4"_s));
+    {
+        LoadingWindow window(workspace.context(), workspace.prompter());
+        window.show();
+        QVERIFY(QTest::qWaitForWindowExposed(&window));
+        window.runSequence();
+        QCOMPARE(window.lblStatus()->text(),
+                 u"You must update the database to work with this version of Veltrix!"_s);
+        QVERIFY(window.butOptions()->isHidden());
+        QCOMPARE(window.focusWidget(), window.butUpdate());
+        QVERIFY(!workspace.context().mainDatabase().isConnected());
+    }
+
+    // Once the database is up to date the start-up hands over; About shows both versions.
+    QVERIFY(workspace.setConfigRow(1, u"1.55"_s));
     LoadingWindow starter(workspace.context(), workspace.prompter());
     QSignalSpy handedOver(&starter, &LoadingWindow::startupSucceeded);
     starter.show();
