@@ -38,8 +38,7 @@ private Q_SLOTS:
     void init();
     void commandsApplyTheBoxes_data();
     void commandsApplyTheBoxes();
-    void showsAndPrintsThePage();
-    void pageSetupMarginsAreUsed();
+    void showsSetsUpAndPrintsThePage();
 
 private:
     QString writePage()
@@ -121,7 +120,7 @@ void TestPrintWindow::commandsApplyTheBoxes()
     QCOMPARE(pageSetupValues(store), before);
 }
 
-void TestPrintWindow::showsAndPrintsThePage()
+void TestPrintWindow::showsSetsUpAndPrintsThePage()
 {
     const QString pdftotext = QStandardPaths::findExecutable(u"pdftotext"_s);
     if (pdftotext.isEmpty())
@@ -133,6 +132,19 @@ void TestPrintWindow::showsAndPrintsThePage()
     QCOMPARE(window.txtHeader()->text(), u"1/7/25 to 30/6/26"_s);
     // The mark-up in the cell is rendered, not shown as text.
     QVERIFY(window.ieFrame()->toPlainText().contains(u"Panel labour gross"_s));
+    QMarginsF margins;
+    window.setPageSetupQuestion([&](QPrinter &printer, QWidget *) {
+        margins = printer.pageLayout().margins(QPageLayout::Inch);
+        printer.setPageMargins(QMarginsF(1.0, 0.25, 1.5, 0.5), QPageLayout::Inch);
+        return true;
+    });
+    window.pageSetup();
+    // The dialog opened on the report's margins (bottom: the browser's 0.75 inch).
+    QCOMPARE(margins, QMarginsF(0.4, 0.5, 0.4, 0.75));
+    const PrintOptions options = PrintOptions::fromStore(m_workspace->store());
+    QCOMPARE(QMarginsF(options.marginLeftInches, options.marginTopInches, options.marginRightInches,
+                       options.marginBottomInches),
+             QMarginsF(1.0, 0.25, 1.5, 0.5));
     window.setPrintQuestion([&](QPrinter &printer, QWidget *) {
         printer.setOutputFormat(QPrinter::PdfFormat);
         printer.setOutputFileName(pdf);
@@ -148,25 +160,6 @@ void TestPrintWindow::showsAndPrintsThePage()
                                  .toString(QDate::currentDate(), QLocale::ShortFormat)));
     QVERIFY(printed.contains(u"Page 1 of 1"_s));
     QVERIFY(printed.contains(u"48.2%"_s));
-}
-
-void TestPrintWindow::pageSetupMarginsAreUsed()
-{
-    PrintWindow window(m_workspace->context(), nullptr);
-    window.showPage(writePage(), u"Title"_s);
-    QMarginsF shown;
-    window.setPageSetupQuestion([&](QPrinter &printer, QWidget *) {
-        shown = printer.pageLayout().margins(QPageLayout::Inch);
-        printer.setPageMargins(QMarginsF(1.0, 0.25, 1.5, 0.5), QPageLayout::Inch);
-        return true;
-    });
-    window.pageSetup();
-    // The dialog opened on the report's margins (bottom: the browser's 0.75 inch).
-    QCOMPARE(shown, QMarginsF(0.4, 0.5, 0.4, 0.75));
-    const PrintOptions options = PrintOptions::fromStore(m_workspace->store());
-    QCOMPARE(QMarginsF(options.marginLeftInches, options.marginTopInches, options.marginRightInches,
-                       options.marginBottomInches),
-             QMarginsF(1.0, 0.25, 1.5, 0.5));
 }
 
 QTEST_MAIN(TestPrintWindow)
