@@ -55,17 +55,16 @@ private Q_SLOTS:
     void mappingAndRatesReachTheNextProduce();
 
 private:
-    static bool connectWorkspace(TestWorkspace &workspace)
+    bool connectWorkspace()
     {
-        return workspace.context().mainDatabase().isConnected() || workspace.connect();
+        return m_workspace->context().mainDatabase().isConnected() || m_workspace->connect();
     }
-    std::unique_ptr<MainWindow> openWindow(TestWorkspace &workspace)
+    std::unique_ptr<MainWindow> openWindow()
     {
-        if (!connectWorkspace(workspace))
+        if (!connectWorkspace())
             return nullptr;
-        workspace.prompter().clearMessages();
-        auto window = std::make_unique<MainWindow>(workspace.context(), workspace.prompter());
-        return window;
+        m_workspace->prompter().clearMessages();
+        return std::make_unique<MainWindow>(m_workspace->context(), m_workspace->prompter());
     }
     // The main window over a demo workspace written to the folder.
     std::unique_ptr<MainWindow> openOnDemo(const QString &folder)
@@ -73,15 +72,13 @@ private:
         if (DemoWorkspace::create(folder, QStringLiteral(VELTRIX_NEW_DB)))
             return nullptr;
         DemoWorkspace::configure(m_workspace->store(), folder);
-        return openWindow(*m_workspace);
+        return openWindow();
     }
-    void addUser(TestWorkspace &workspace, const QString &name)
+    void addUser(const QString &name)
     {
-        QSqlQuery query(workspace.context().mainDatabase().database());
-        query.prepare(
-            u"INSERT INTO Users (UserName, Password, Type, Fields) VALUES (?, 'pw', 0, '1')"_s);
-        query.addBindValue(name);
-        QVERIFY(query.exec());
+        QVERIFY(m_workspace->exec(
+            u"INSERT INTO Users (UserName, Password, Type, Fields) VALUES (?, 'pw', 0, '1')"_s,
+            {name}));
     }
 
     std::unique_ptr<TestWorkspace> m_workspace;
@@ -101,7 +98,7 @@ void TestMainWindow::cleanup()
 
 void TestMainWindow::builtInAccountWithNoUsersAndStepButtons()
 {
-    auto window = openWindow(*m_workspace);
+    auto window = openWindow();
     QVERIFY(window);
     QCOMPARE(window->lstUsers()->currentText(), u"sysop"_s);
     QCOMPARE(m_workspace->prompter().messages().size(), 1);
@@ -153,7 +150,7 @@ void TestMainWindow::yearIsCheckedBeforeUse()
     QFETCH(QString, year);
     QFETCH(QString, action);
     QFETCH(QString, title);
-    auto window = openWindow(*m_workspace);
+    auto window = openWindow();
     QVERIFY(window);
     window->show();
     QVERIFY(QTest::qWaitForWindowActive(window.get()));
@@ -194,10 +191,10 @@ void TestMainWindow::clockFormat()
 
 void TestMainWindow::typeAheadThenNetworkRequests()
 {
-    QVERIFY(connectWorkspace(*m_workspace));
-    addUser(*m_workspace, u"Anna"_s);
-    addUser(*m_workspace, u"Bob"_s);
-    auto window = openWindow(*m_workspace);
+    QVERIFY(connectWorkspace());
+    addUser(u"Anna"_s);
+    addUser(u"Bob"_s);
+    auto window = openWindow();
     QVERIFY(window);
     window->show();
     QVERIFY(QTest::qWaitForWindowExposed(window.get()));
