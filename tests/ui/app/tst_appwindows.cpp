@@ -24,14 +24,13 @@ class TestAppWindows : public QObject
     Q_OBJECT
 
 private Q_SLOTS:
-    void configShowsTheStoredSettingsAndKeepsTheLogin();
-    void configBrowsesAndRefusesAMissingFolder();
+    void configShowsRefusesAndSaves();
     void loadingFailsThenOffersOptions();
     void loadingOffersTheUpdateOrHandsOver();
     void placementIsRestored();
 };
 
-void TestAppWindows::configShowsTheStoredSettingsAndKeepsTheLogin()
+void TestAppWindows::configShowsRefusesAndSaves()
 {
     TestWorkspace workspace;
     SettingsStore &store = workspace.store();
@@ -62,38 +61,35 @@ void TestAppWindows::configShowsTheStoredSettingsAndKeepsTheLogin()
     QVERIFY(dialog.driverRow()->isHidden());
     QCOMPARE(dialog.lstDriver()->currentText(), u"MYOAU0801"_s);
 
-    dialog.txtDBPath()->setText(workspace.sharedFolder());
-    dialog.txtAccFilePath()->clear(); // the stored file does not exist here
-    dialog.butOK()->click();
-    QVERIFY(dialog.saved());
-    QCOMPARE(store.readSetting(u"AccFileUser"_s), u"Admin"_s);
-    QCOMPARE(store.readSetting(u"AccPackage"_s), u"MoneyWorks"_s);
-}
-
-void TestAppWindows::configBrowsesAndRefusesAMissingFolder()
-{
-    TestWorkspace workspace;
-    ConfigDialog dialog(workspace.store(), workspace.prompter());
+    // Browsed paths are taken; a folder that does not exist is refused.
     dialog.show();
-    // An empty store selects nothing.
-    QVERIFY(!dialog.optAccPackage(0)->isChecked());
-    QVERIFY(!dialog.optAccPackage(1)->isChecked());
-    QVERIFY(dialog.picLogin()->isHidden());
     workspace.prompter().scriptChosenPath(u"/books/acme.mwd5"_s);
     dialog.butBrowseFile()->click();
     QCOMPARE(dialog.txtAccFilePath()->text(), u"/books/acme.mwd5"_s);
+    dialog.txtAccFilePath()->clear(); // no such file here
     workspace.prompter().scriptChosenPath(u"/no/such/folder"_s);
     dialog.butBrowsePath()->click();
     dialog.butBrowsePath()->click(); // cancelled: nothing chosen
     QCOMPARE(dialog.txtDBPath()->text(), u"/no/such/folder"_s);
-
-    dialog.optAccPackage(0)->click();
     dialog.butOK()->click();
     QVERIFY(!dialog.saved());
     QVERIFY(dialog.isVisible());
     QCOMPARE(dialog.txtDBPath()->text(), u"/no/such/folder"_s + QDir::separator());
     QCOMPARE(workspace.prompter().messages().size(), 1);
     QCOMPARE(workspace.prompter().messages().first().title, u"Invalid Folder Path"_s);
+
+    dialog.txtDBPath()->setText(workspace.sharedFolder());
+    dialog.butOK()->click();
+    QVERIFY(dialog.saved());
+    QCOMPARE(store.readSetting(u"AccFileUser"_s), u"Admin"_s);
+    QCOMPARE(store.readSetting(u"AccPackage"_s), u"MoneyWorks"_s);
+
+    // An empty store selects nothing.
+    TestWorkspace fresh;
+    ConfigDialog empty(fresh.store(), fresh.prompter());
+    QVERIFY(!empty.optAccPackage(0)->isChecked());
+    QVERIFY(!empty.optAccPackage(1)->isChecked());
+    QVERIFY(empty.picLogin()->isHidden());
 }
 
 void TestAppWindows::loadingFailsThenOffersOptions()
