@@ -33,11 +33,8 @@ private Q_SLOTS:
     void formatSetupList();
     void fitColumn_data();
     void fitColumn();
-    void selectRowById_data();
-    void selectRowById();
-    void findGridRowIgnoresCase();
-    void cellStyles();
-    void redrawSuspensionAnnouncesOnce();
+    void rowsAreFoundByIdOrText();
+    void cellStylesAndRedraw();
 };
 
 void TestGridOperations::sortTypesByKey_data()
@@ -131,39 +128,28 @@ void TestGridOperations::fitColumn()
     QCOMPARE(grid.column(4).width, width);
 }
 
-void TestGridOperations::selectRowById_data()
+void TestGridOperations::rowsAreFoundByIdOrText()
 {
-    QTest::addColumn<qint64>("id");
-    QTest::addColumn<int>("row");
-    QTest::newRow("found") << qint64(7) << 2;
-    QTest::newRow("not there") << qint64(99) << 1;
-    QTest::newRow("zero") << qint64(0) << 1;
-}
-
-void TestGridOperations::selectRowById()
-{
-    QFETCH(qint64, id);
-    QFETCH(int, row);
     GridModel grid;
     grid.addColumn(u"id"_s, QString(), 0, 10, true);
+    grid.addColumn(u"name"_s, QString(), 0, 10, true);
     GridOperations::selectRowById(grid, 1); // no rows: nothing happens
     QCOMPARE(grid.selectedRow(), 0);
-    addRows(grid, {{u"3"_s}, {u"7"_s}});
-    GridOperations::selectRowById(grid, id);
-    QCOMPARE(grid.selectedRow(), row);
+    QCOMPARE(findGridRow(grid, 2, u"x"_s), 0);
+    addRows(grid, {{u"3"_s, u"Anna"_s}, {u"7"_s, u"BOB"_s}, {u"9"_s, u"bob"_s}});
+    GridOperations::selectRowById(grid, 7);
+    QCOMPARE(grid.selectedRow(), 2);
+    // An ID not listed, or none, selects the first row.
+    for (const qint64 id : {qint64(99), qint64(0)}) {
+        grid.setSelectedRow(3);
+        GridOperations::selectRowById(grid, id);
+        QCOMPARE(grid.selectedRow(), 1);
+    }
+    QCOMPARE(findGridRow(grid, 2, u"bob"_s), 2); // the first, whatever its case
+    QCOMPARE(findGridRow(grid, 2, u"carl"_s), 0);
 }
 
-void TestGridOperations::findGridRowIgnoresCase()
-{
-    GridModel grid;
-    grid.addColumn(u"name"_s, QString(), 0, 10, true);
-    QCOMPARE(findGridRow(grid, 1, u"x"_s), 0);
-    addRows(grid, {{u"Anna"_s}, {u"BOB"_s}, {u"bob"_s}});
-    QCOMPARE(findGridRow(grid, 1, u"bob"_s), 2);
-    QCOMPARE(findGridRow(grid, 1, u"carl"_s), 0);
-}
-
-void TestGridOperations::cellStyles()
+void TestGridOperations::cellStylesAndRedraw()
 {
     GridModel grid;
     grid.setFont({u"Arial"_s, 10.0, false});
@@ -182,12 +168,8 @@ void TestGridOperations::cellStyles()
     QCOMPARE(getCellNumber(grid, 1, 1, numbers), 12.5);
     grid.setCellText(1, 1, u"n/a"_s);
     QCOMPARE(getCellNumber(grid, 1, 1, numbers), 0.0);
-}
 
-void TestGridOperations::redrawSuspensionAnnouncesOnce()
-{
-    GridModel grid;
-    grid.addColumn(u"a"_s, QString(), 0, 10, true);
+    // Changes made while redrawing is off are announced once, when it is back on.
     QSignalSpy changes(&grid, &GridModel::contentChanged);
     grid.setRedraw(false);
     for (int i = 0; i < 5; ++i)

@@ -38,9 +38,7 @@ private Q_SLOTS:
     void init();
     void commandsApplyTheBoxes_data();
     void commandsApplyTheBoxes();
-    void showsAndPrintsThePage();
-    void closingRestoresTheUsersValues();
-    void pageSetupMarginsAreUsed();
+    void showsSetsUpAndPrintsThePage();
 
 private:
     QString writePage()
@@ -88,11 +86,17 @@ void TestPrintWindow::commandsApplyTheBoxes()
     QFETCH(bool, pages);
     QFETCH(QString, header);
     QFETCH(QStringList, expected);
+    // The window uses its own page set-up and gives the user's back, an absent value absent,
+    // when it closes.
+    SettingsStore &store = m_workspace->store();
+    store.writeSetting(u"margin_top"_s, u"0.75"_s, PageSetupSession::Key);
+    store.writeSetting(u"footer"_s, u"&u&b&d"_s, PageSetupSession::Key);
+    const QStringList before = pageSetupValues(store);
     PrintWindow window(m_workspace->context(), nullptr);
     window.showPage(writePage(), u"Title"_s);
+    QCOMPARE(store.readSetting(u"margin_top"_s, PageSetupSession::Key), u"0.5"_s);
     QStringList seen;
     const auto answer = [&](QPrinter &, QWidget *) {
-        SettingsStore &store = m_workspace->store();
         const QString key = PageSetupSession::Key;
         seen = {store.readSetting(u"Print_Background"_s, key), store.readSetting(u"header"_s, key),
                 store.readSetting(u"footer"_s, key)};
@@ -112,9 +116,11 @@ void TestPrintWindow::commandsApplyTheBoxes()
     else
         window.pageSetup();
     QCOMPARE(seen, expected);
+    window.reject();
+    QCOMPARE(pageSetupValues(store), before);
 }
 
-void TestPrintWindow::showsAndPrintsThePage()
+void TestPrintWindow::showsSetsUpAndPrintsThePage()
 {
     const QString pdftotext = QStandardPaths::findExecutable(u"pdftotext"_s);
     if (pdftotext.isEmpty())
@@ -126,6 +132,19 @@ void TestPrintWindow::showsAndPrintsThePage()
     QCOMPARE(window.txtHeader()->text(), u"1/7/25 to 30/6/26"_s);
     // The mark-up in the cell is rendered, not shown as text.
     QVERIFY(window.ieFrame()->toPlainText().contains(u"Panel labour gross"_s));
+    QMarginsF margins;
+    window.setPageSetupQuestion([&](QPrinter &printer, QWidget *) {
+        margins = printer.pageLayout().margins(QPageLayout::Inch);
+        printer.setPageMargins(QMarginsF(1.0, 0.25, 1.5, 0.5), QPageLayout::Inch);
+        return true;
+    });
+    window.pageSetup();
+    // The dialog opened on the report's margins (bottom: the browser's 0.75 inch).
+    QCOMPARE(margins, QMarginsF(0.4, 0.5, 0.4, 0.75));
+    const PrintOptions options = PrintOptions::fromStore(m_workspace->store());
+    QCOMPARE(QMarginsF(options.marginLeftInches, options.marginTopInches, options.marginRightInches,
+                       options.marginBottomInches),
+             QMarginsF(1.0, 0.25, 1.5, 0.5));
     window.setPrintQuestion([&](QPrinter &printer, QWidget *) {
         printer.setOutputFormat(QPrinter::PdfFormat);
         printer.setOutputFileName(pdf);
@@ -141,51 +160,6 @@ void TestPrintWindow::showsAndPrintsThePage()
                                  .toString(QDate::currentDate(), QLocale::ShortFormat)));
     QVERIFY(printed.contains(u"Page 1 of 1"_s));
     QVERIFY(printed.contains(u"48.2%"_s));
-}
-
-void TestPrintWindow::closingRestoresTheUsersValues()
-{
-    SettingsStore &store = m_workspace->store();
-    store.writeSetting(u"margin_top"_s, u"0.75"_s, PageSetupSession::Key);
-    store.writeSetting(u"footer"_s, u"&u&b&d"_s, PageSetupSession::Key);
-    const QStringList before = pageSetupValues(store);
-    {
-        PrintWindow window(m_workspace->context(), nullptr);
-        window.showPage(writePage(), u"Title"_s);
-        QCOMPARE(store.readSetting(u"margin_top"_s, PageSetupSession::Key), u"0.5"_s);
-        window.setPrintQuestion([](QPrinter &, QWidget *) { return false; });
-        window.chkPages()->setChecked(false);
-        window.print();
-        window.reject();
-        QStringList after = pageSetupValues(store);
-        // An absent value comes back empty.
-        for (int i = 0; i < before.size(); ++i) {
-            QCOMPARE(after[i], before[i] == u"<absent>"_s ? QString(u"<absent>"_s) : before[i]);
-        }
-    }
-    QCOMPARE(store.readSetting(u"margin_top"_s, PageSetupSession::Key), u"0.75"_s);
-    QCOMPARE(store.readSetting(u"footer"_s, PageSetupSession::Key), u"&u&b&d"_s);
-    QCOMPARE(store.readSetting(u"header"_s, PageSetupSession::Key, u"<absent>"_s), u"<absent>"_s);
-}
-
-void TestPrintWindow::pageSetupMarginsAreUsed()
-{
-    PrintWindow window(m_workspace->context(), nullptr);
-    window.showPage(writePage(), u"Title"_s);
-    QMarginsF shown;
-    window.setPageSetupQuestion([&](QPrinter &printer, QWidget *) {
-        shown = printer.pageLayout().margins(QPageLayout::Inch);
-        printer.setPageMargins(QMarginsF(1.0, 0.25, 1.5, 0.5), QPageLayout::Inch);
-        return true;
-    });
-    window.pageSetup();
-    // The dialog opened on the report's margins (bottom: the browser's 0.75 inch).
-    QCOMPARE(shown, QMarginsF(0.4, 0.5, 0.4, 0.75));
-    const PrintOptions options = PrintOptions::fromStore(m_workspace->store());
-    QCOMPARE(options.marginLeftInches, 1.0);
-    QCOMPARE(options.marginTopInches, 0.25);
-    QCOMPARE(options.marginRightInches, 1.5);
-    QCOMPARE(options.marginBottomInches, 0.5);
 }
 
 QTEST_MAIN(TestPrintWindow)

@@ -4,6 +4,7 @@
 
 #include "app/demoworkspace.h"
 #include "app/producecommand.h"
+#include "common/fileoperations.h"
 #include "grid/gridoperations.h"
 #include "report/gifencoder.h"
 #include "report/printwindow.h"
@@ -14,7 +15,6 @@
 #include "views/kpitabview.h"
 #include "views/tabviewbuilder.h"
 
-#include <QApplication>
 #include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
@@ -42,11 +42,8 @@ class TestCompareWindow : public QObject
 
 private Q_SLOTS:
     void initTestCase();
-    void loadsEarlierPeriodsIntoColumns_data();
-    void loadsEarlierPeriodsIntoColumns();
-    void earlierColumnsMatchTheirOwnProduce();
-    void graphStretchesAndHighestPeriodIsHighlighted();
-    void printFromTheGraphTab();
+    void loadsEarlierPeriodsIntoColumnsAndPrints();
+    void fourYearsMatchTheirOwnProduceAndTheHighestIsMarked();
 
 private:
     void produce(int firstMonth, int firstYear, int lastMonth, int lastYear)
@@ -73,55 +70,76 @@ void TestCompareWindow::initTestCase()
     context.loginState() = LoginState{true, u"sysop"_s, 1, QString()};
 }
 
-void TestCompareWindow::loadsEarlierPeriodsIntoColumns_data()
+void TestCompareWindow::loadsEarlierPeriodsIntoColumnsAndPrints()
 {
-    QTest::addColumn<QString>("kind");
-    QTest::addColumn<int>("count");
-    QTest::addColumn<QList<int>>("range"); // produced: month, year, month, year
-    QTest::addColumn<QStringList>("headers");
-    QTest::newRow("years, 2") << u"Years"_s << 2 << QList<int>{7, 2025, 6, 2026}
-                              << QStringList{u"Jul 25 - Jun 26"_s, u"Jul 24 - Jun 25"_s,
-                                             u"Jul 23 - Jun 24"_s};
-    QTest::newRow("periods of 3 months") << u"Periods"_s << 1 << QList<int>{1, 2026, 3, 2026}
-                                         << QStringList{u"Jan 26 - Mar 26"_s, u"Oct 25 - Dec 25"_s};
-}
-
-void TestCompareWindow::loadsEarlierPeriodsIntoColumns()
-{
-    QFETCH(QString, kind);
-    QFETCH(int, count);
-    QFETCH(QList<int>, range);
-    QFETCH(QStringList, headers);
-    produce(range[0], range[1], range[2], range[3]);
-
-    CompareWindow window(m_workspace->context(), *ComparisonRanges::kindFromText(kind), count);
+    produce(1, 2026, 3, 2026);
+    CompareWindow window(m_workspace->context(), ComparisonRanges::Kind::Periods, 1);
     QCOMPARE(window.lblLoad()->text(),
-             u"Please wait while we load the past '%1 %2' of data..."_s.arg(count).arg(
-                 count == 1 ? kind.chopped(1) : kind));
+             u"Please wait while we load the past '1 Period' of data..."_s);
     window.show();
     QVERIFY(window.picLoad()->isVisible());
     QCOMPARE(window.shpProgress()->width(), 0);
     QVERIFY(waitUntilLoaded(window));
     // The legend names every period, oldest first, and explains the highlight.
-    QCOMPARE(window.lblLegend()->text().count(u" · "_s), count);
+    QCOMPARE(window.lblLegend()->text().count(u" · "_s), 1);
     QVERIFY(window.lblLegend()->text().contains(KpiGrid::Highest.name()));
     QVERIFY(!window.picLoad()->isVisible());
     QCOMPARE(window.shpProgress()->width(), window.shpProgress()->parentWidget()->width());
 
     const GridModel &grid = window.tabView()->grid();
-    QCOMPARE(grid.column(grid.columnIndex(u"value"_s)).header, headers[0]);
-    for (int slot = 1; slot <= 4; ++slot) {
-        const GridModel::Column &column =
-            grid.column(grid.columnIndex(u"value"_s + QString::number(slot)));
-        QCOMPARE(column.visible, slot <= count);
-        if (slot <= count)
-            QCOMPARE(column.header, headers[slot]);
-    }
+    QCOMPARE(grid.column(grid.columnIndex(u"value"_s)).header, u"Jan 26 - Mar 26"_s);
+    QCOMPARE(grid.column(grid.columnIndex(u"value1"_s)).header, u"Oct 25 - Dec 25"_s);
+    for (const QString &hidden : {u"value2"_s, u"value3"_s, u"value4"_s})
+        QVERIFY(!grid.column(grid.columnIndex(hidden)).visible);
     QCOMPARE(window.tabView()->currentTab(), 0);
     QVERIFY(window.tabButton(0)->isChecked());
+
+    // Printed from the graph tab, the page has the graph's picture.
+    window.selectTab(TabViewBuilder::SummaryTab);
+    const Settings &settings = m_workspace->context().settings();
+    QFile::remove(settings.tempBmpFile);
+
+    QString header;
+    QString shown;
+    whenModalOpens<PrintWindow>([&](PrintWindow &print) {
+        header = print.txtHeader()->text();
+        shown = print.ieFrame()->toPlainText();
+    });
+    window.print();
+    QCOMPARE(header, u"Summary: 1/1/26 to 31/3/26"_s);
+    QVERIFY(shown.contains(u"Panel labour gross profit %"_s));
+
+    const QString page = FileOperations::readTextFile(settings.tempHtmlFile);
+    const QString picture = u"<p align='left'><img src='"_s + settings.tempBmpFile + u"'></p>"_s;
+    QVERIFY(page.contains(picture));
+    QVERIFY(page.indexOf(picture) > page.indexOf(u"</table>"_s));
+    QVERIFY(page.contains(u"Oct 25 - Dec 25"_s));
+    QVERIFY(!page.contains(u">id<"_s));
+    QVERIFY(!QFile::exists(settings.tempGifFile));
+
+    // The picture is the graph as drawn, its white ground kept, its bars in cube colours.
+    const QImage snapshot(settings.tempBmpFile);
+    GraphArea *graph = window.tabView()->picGraph();
+    QCOMPARE(snapshot.size(), graph->size());
+    QCOMPARE(snapshot.pixel(0, 0), qRgb(255, 255, 255));
+    const QImage drawn = graph->grab().toImage();
+    const BarGraphItem *bar = graph->bars().first();
+    const QPoint inside = bar->geometry().center();
+    QCOMPARE(snapshot.pixel(inside),
+             GifEncoder::fixedPalette()[GifEncoder::nearestCubeIndex(drawn.pixel(inside))]);
+
+    // From another tab the page has no picture.
+    window.selectTab(2);
+    whenModalOpens<PrintWindow>([](PrintWindow &) {});
+    window.print();
+    QFile file(settings.tempHtmlFile);
+    QVERIFY(file.open(QIODevice::ReadOnly));
+    const QByteArray table = file.readAll();
+    QVERIFY(!table.contains("<img"));
+    QVERIFY(table.endsWith("</table>\r\n</body></html>\r\n"));
 }
 
-void TestCompareWindow::earlierColumnsMatchTheirOwnProduce()
+void TestCompareWindow::fourYearsMatchTheirOwnProduceAndTheHighestIsMarked()
 {
     // What the comparison shows for a year back is what producing that year shows.
     produce(7, 2024, 6, 2025);
@@ -131,9 +149,13 @@ void TestCompareWindow::earlierColumnsMatchTheirOwnProduce()
     QStringList expected;
     for (int row = 1; row <= alone.rowCount(); ++row)
         expected << alone.cellText(row, alone.columnIndex(u"value"_s));
+    QVERIFY(expected.contains(u"53%"_s));
 
     produce(7, 2025, 6, 2026);
-    CompareWindow window(m_workspace->context(), ComparisonRanges::Kind::Years, 1);
+    CompareWindow window(m_workspace->context(), ComparisonRanges::Kind::Years, 4);
+    QCOMPARE(window.lblLoad()->text(),
+             u"Please wait while we load the past '4 Years' of data..."_s);
+    window.resize(900, 700);
     window.show();
     QVERIFY(waitUntilLoaded(window));
     const GridModel &grid = window.tabView()->grid();
@@ -141,17 +163,6 @@ void TestCompareWindow::earlierColumnsMatchTheirOwnProduce()
     for (int row = 1; row <= grid.rowCount(); ++row)
         shown << grid.cellText(row, grid.columnIndex(u"value1"_s));
     QCOMPARE(shown, expected);
-    QVERIFY(expected.contains(u"53%"_s));
-}
-
-void TestCompareWindow::graphStretchesAndHighestPeriodIsHighlighted()
-{
-    produce(7, 2025, 6, 2026);
-    CompareWindow window(m_workspace->context(), ComparisonRanges::Kind::Years, 4);
-    window.resize(900, 700);
-    window.show();
-    QVERIFY(waitUntilLoaded(window));
-    const GridModel &grid = window.tabView()->grid();
     const int row = GridOperations::findGridRow(grid, grid.columnIndex(u"label"_s),
                                                 u"Repair orders invoiced"_s);
     QVERIFY(row > 0);
@@ -179,59 +190,6 @@ void TestCompareWindow::graphStretchesAndHighestPeriodIsHighlighted()
     bars[6]->setFocus(Qt::MouseFocusReason);
     QCoreApplication::processEvents();
     QCOMPARE(grid.cellText(grid.selectedRow(), 1).toLongLong(), bars[6]->tag());
-}
-
-void TestCompareWindow::printFromTheGraphTab()
-{
-    produce(7, 2025, 6, 2026);
-    CompareWindow window(m_workspace->context(), ComparisonRanges::Kind::Years, 1);
-    window.show();
-    QVERIFY(waitUntilLoaded(window));
-    window.selectTab(TabViewBuilder::SummaryTab);
-    const Settings &settings = m_workspace->context().settings();
-    QFile::remove(settings.tempBmpFile);
-
-    QString header;
-    QString shown;
-    whenModalOpens<PrintWindow>([&](PrintWindow &print) {
-        header = print.txtHeader()->text();
-        shown = print.ieFrame()->toPlainText();
-    });
-    window.print();
-    QCOMPARE(header, u"Summary: 1/7/25 to 30/6/26"_s);
-    QVERIFY(shown.contains(u"Panel labour gross profit %"_s));
-
-    const QString page = QString::fromUtf8([&] {
-        QFile file(settings.tempHtmlFile);
-        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
-    }());
-    const QString picture = u"<p align='left'><img src='"_s + settings.tempBmpFile + u"'></p>"_s;
-    QVERIFY(page.contains(picture));
-    QVERIFY(page.indexOf(picture) > page.indexOf(u"</table>"_s));
-    QVERIFY(page.contains(u"Jul 24 - Jun 25"_s));
-    QVERIFY(!page.contains(u">id<"_s));
-    QVERIFY(!QFile::exists(settings.tempGifFile));
-
-    // The picture is the graph as drawn, its white ground kept, its bars in cube colours.
-    const QImage snapshot(settings.tempBmpFile);
-    GraphArea *graph = window.tabView()->picGraph();
-    QCOMPARE(snapshot.size(), graph->size());
-    QCOMPARE(snapshot.pixel(0, 0), qRgb(255, 255, 255));
-    const QImage drawn = graph->grab().toImage();
-    const BarGraphItem *bar = graph->bars().first();
-    const QPoint inside = bar->geometry().center();
-    QCOMPARE(snapshot.pixel(inside),
-             GifEncoder::fixedPalette()[GifEncoder::nearestCubeIndex(drawn.pixel(inside))]);
-
-    // From another tab the page has no picture.
-    window.selectTab(2);
-    whenModalOpens<PrintWindow>([](PrintWindow &) {});
-    window.print();
-    QFile file(settings.tempHtmlFile);
-    QVERIFY(file.open(QIODevice::ReadOnly));
-    const QByteArray table = file.readAll();
-    QVERIFY(!table.contains("<img"));
-    QVERIFY(table.endsWith("</table>\r\n</body></html>\r\n"));
 }
 
 QTEST_MAIN(TestCompareWindow)
