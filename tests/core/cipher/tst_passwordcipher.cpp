@@ -198,8 +198,7 @@ void TestPasswordCipher::keyUsability_data()
 {
     QTest::addColumn<QString>("key");
     QTest::addColumn<bool>("usable");
-    QTest::newRow("the settings key") << Key << true;
-    QTest::newRow("four characters") << u"abcd"_s << false;
+    // Four characters are refused by a row of the decryption failures.
     QTest::newRow("five different") << u"abcde"_s << true;
     QTest::newRow("one character repeated") << u"aaaaa"_s << false;
     QTest::newRow("three letters twice") << u"abcabc"_s << false;
@@ -296,8 +295,6 @@ void TestPasswordCipher::armourBreaksLongLines()
     QCOMPARE(Base64Armour::decode(text), bytes);
     // Below ten counts as ten: a break after every twelfth character.
     QCOMPARE(Base64Armour::encode(bytes, 3).split(u"\r\n"_s).first().size(), 12);
-    QCOMPARE(Base64Armour::encode(QByteArrayLiteral("ab"), 9999), u"YWI="_s);
-    QCOMPARE(Base64Armour::decode(u"YWI="_s), QByteArrayLiteral("ab"));
     QCOMPARE(Base64Armour::decode(u"YW="_s), QByteArray());
 }
 
