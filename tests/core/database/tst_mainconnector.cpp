@@ -44,9 +44,7 @@ private Q_SLOTS:
     void unusableDatabase_data();
     void unusableDatabase();
     void lockedDatabaseFails();
-    void configValues();
     void missingConfigRowIsReportedOnEveryAccess();
-    void disconnectClosesEverything();
     void twoProcessesWriteConfigTogether();
 
 private:
@@ -115,7 +113,7 @@ void TestMainConnector::opensTheStandingRecordsets()
     }
     QCOMPARE(perTab, 123);
     QVERIFY(context().periodDataSet().slot(0).isEmpty());
-    QVERIFY(m_workspace->prompter().messages().size() == 1); // "New Database" only
+    QCOMPARE(m_workspace->prompter().messages().size(), 1); // "New Database" only
 }
 
 void TestMainConnector::cacheFile_data()
@@ -169,7 +167,8 @@ void TestMainConnector::cacheFile()
     QCOMPARE(kept.size(), 1);
     QVERIFY(report.text.contains(kept.first()));
     QFile keptFile(m_workspace->appFolder() + kept.first());
-    QVERIFY(keptFile.open(QIODevice::ReadOnly) && keptFile.readAll() == content);
+    QVERIFY(keptFile.open(QIODevice::ReadOnly));
+    QCOMPARE(keptFile.readAll(), content);
     QCOMPARE(connectMainDatabase(context()), QString());
     QVERIFY(context().periodDataSet().slot(0).isEmpty());
 }
@@ -236,19 +235,6 @@ void TestMainConnector::lockedDatabaseFails()
     QVERIFY(lock.exec(u"ROLLBACK"_s));
 }
 
-void TestMainConnector::configValues()
-{
-    QCOMPARE(connectAfterSettings(), QString());
-    const ConfigValues config(context().mainDatabase(), m_workspace->prompter());
-    QCOMPARE(config.getConfigValue(ConfigValues::UserCount), u"0"_s);
-    QCOMPARE(config.setConfigValue(ConfigValues::NetworkRequest, u"Logoff"_s), std::nullopt);
-
-    // Another copy sees the value at once, and this copy sees what the other wrote.
-    QCOMPARE(m_workspace->value(u"SELECT Value FROM Config WHERE ID = 5"_s), u"Logoff"_s);
-    QVERIFY(m_workspace->exec(u"UPDATE Config SET Value = '3' WHERE ID = 4"_s));
-    QCOMPARE(config.getConfigValue(ConfigValues::UserCount), u"3"_s);
-}
-
 void TestMainConnector::missingConfigRowIsReportedOnEveryAccess()
 {
     QCOMPARE(loadSettings(context()), QString());
@@ -271,17 +257,6 @@ void TestMainConnector::missingConfigRowIsReportedOnEveryAccess()
         QCOMPARE(message.icon, Prompter::Icon::None);
         QCOMPARE(message.buttons, Prompter::Buttons::Ok);
     }
-}
-
-void TestMainConnector::disconnectClosesEverything()
-{
-    QCOMPARE(connectAfterSettings(), QString());
-    disconnectMainDatabase(context());
-    QVERIFY(!context().mainDatabase().isConnected());
-    QVERIFY(!context().mainDatabase().fieldsRecordset().isOpen());
-    // A second connection is built from scratch.
-    QCOMPARE(connectMainDatabase(context()), QString());
-    QVERIFY(context().mainDatabase().fieldsRecordset().isOpen());
 }
 
 void TestMainConnector::twoProcessesWriteConfigTogether()
