@@ -31,6 +31,15 @@ private:
     int &m_disconnects;
 };
 
+// A workspace started up as the program does.
+std::unique_ptr<TestWorkspace> startedWorkspace()
+{
+    auto workspace = std::make_unique<TestWorkspace>();
+    if (!workspace->configure() || runStartupSequence(workspace->context()).failed)
+        return nullptr;
+    return workspace;
+}
+
 } // namespace
 
 class TestStartupShutdown : public QObject
@@ -43,7 +52,6 @@ private Q_SLOTS:
     void outcomes_data();
     void outcomes();
     void shutDownKeepsSlotZero();
-    void shutDownWithEmptySlotKeepsOldCache();
     void shutDownLogsOffOnlyALoggedInUser();
     void cacheWrittenAtShutDownIsReadAtNextStart();
 };
@@ -108,10 +116,9 @@ void TestStartupShutdown::outcomes()
 
 void TestStartupShutdown::shutDownKeepsSlotZero()
 {
-    TestWorkspace workspace;
-    QVERIFY(workspace.configure());
-    QVERIFY(!runStartupSequence(workspace.context()).failed);
-    AppContext &context = workspace.context();
+    const auto workspace = startedWorkspace();
+    QVERIFY(workspace);
+    AppContext &context = workspace->context();
     int disconnects = 0;
     context.setAccountingSource(std::make_unique<CountingSource>(disconnects));
     PeriodDataSet &data = context.periodDataSet();
@@ -131,47 +138,34 @@ void TestStartupShutdown::shutDownKeepsSlotZero()
     QVERIFY(!QFileInfo::exists(context.settings().tempFolder));
 }
 
-void TestStartupShutdown::shutDownWithEmptySlotKeepsOldCache()
-{
-    TestWorkspace workspace;
-    QVERIFY(workspace.configure());
-    QVERIFY(!runStartupSequence(workspace.context()).failed);
-    const QString cache = workspace.context().settings().cacheFile;
-    QVERIFY(!QFileInfo::exists(cache));
-    shutDown(workspace.context());
-    QVERIFY(!QFileInfo::exists(cache));
-}
-
 void TestStartupShutdown::shutDownLogsOffOnlyALoggedInUser()
 {
     for (const bool loggedIn : {false, true}) {
-        TestWorkspace workspace;
-        QVERIFY(workspace.configure());
-        QVERIFY(!runStartupSequence(workspace.context()).failed);
-        QCOMPARE(ConfigValues(workspace.context().mainDatabase(), workspace.prompter())
-                     .setConfigValue(ConfigValues::UserCount, u"2"_s),
-                 std::nullopt);
-        workspace.context().loginState() = LoginState{loggedIn, u"bob"_s, 0, QString()};
-        shutDown(workspace.context());
-        QVERIFY(runStartupSequence(workspace.context()).message.isEmpty());
-        QCOMPARE(ConfigValues(workspace.context().mainDatabase(), workspace.prompter())
-                     .getConfigValue(ConfigValues::UserCount),
-                 loggedIn ? u"1"_s : u"2"_s);
+        const auto workspace = startedWorkspace();
+        QVERIFY(workspace);
+        AppContext &context = workspace->context();
+        const ConfigValues config(context.mainDatabase(), workspace->prompter());
+        QCOMPARE(config.setConfigValue(ConfigValues::UserCount, u"2"_s), std::nullopt);
+        context.loginState() = LoginState{loggedIn, u"bob"_s, 0, QString()};
+        shutDown(context);
+        // With nothing in slot 0, no cache file is written.
+        QVERIFY(!QFileInfo::exists(context.settings().cacheFile));
+        QVERIFY(runStartupSequence(context).message.isEmpty());
+        QCOMPARE(config.getConfigValue(ConfigValues::UserCount), loggedIn ? u"1"_s : u"2"_s);
     }
 }
 
 void TestStartupShutdown::cacheWrittenAtShutDownIsReadAtNextStart()
 {
-    TestWorkspace workspace;
-    QVERIFY(workspace.configure());
-    QVERIFY(!runStartupSequence(workspace.context()).failed);
-    workspace.context().periodDataSet().storeFieldValue(104, 0.1234, 1);
-    workspace.context().periodDataSet().storeAccountFigure(13, -5000.0, 2);
-    shutDown(workspace.context());
+    const auto workspace = startedWorkspace();
+    QVERIFY(workspace);
+    PeriodDataSet &data = workspace->context().periodDataSet();
+    data.storeFieldValue(104, 0.1234, 1);
+    data.storeAccountFigure(13, -5000.0, 2);
+    shutDown(workspace->context());
 
-    workspace.context().periodDataSet().slot(0) = PeriodDataSet::Slot();
-    QVERIFY(!runStartupSequence(workspace.context()).failed);
-    const PeriodDataSet &data = workspace.context().periodDataSet();
+    data.slot(0) = PeriodDataSet::Slot();
+    QVERIFY(!runStartupSequence(workspace->context()).failed);
     QCOMPARE(data.getFieldValue(104), 12.3);
     QCOMPARE(data.getFieldValue(13), 5000.0);
 }
