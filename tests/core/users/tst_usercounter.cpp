@@ -16,7 +16,6 @@ class TestUserCounter : public QObject
 
 private Q_SLOTS:
     void init();
-    void cleanup();
     void counts_data();
     void counts();
     void pollActsOnceAndWithdrawsTheRequest_data();
@@ -38,11 +37,6 @@ void TestUserCounter::init()
     m_workspace = std::make_unique<TestWorkspace>();
     QVERIFY(m_workspace->configure());
     QVERIFY(m_workspace->connect());
-}
-
-void TestUserCounter::cleanup()
-{
-    m_workspace.reset();
 }
 
 // Resetting the count is the main window's reset test, which reads both rows back.
