@@ -16,7 +16,6 @@ class TestLoginSession : public QObject
 
 private Q_SLOTS:
     void init();
-    void cleanup();
     void loginCountsAndLogoffUncounts();
     void twoCopiesCountToTwoAndBack();
 
@@ -37,11 +36,6 @@ void TestLoginSession::init()
     QVERIFY(QSqlQuery(m_workspace->context().mainDatabase().database())
                 .exec(u"INSERT INTO Users (UserName, Password, Type, Fields) "
                       u"VALUES ('bob', 'pw', 0, '1,2')"_s));
-}
-
-void TestLoginSession::cleanup()
-{
-    m_workspace.reset();
 }
 
 // The built-in account is never counted: the main window's log-in table shows it.
