@@ -35,7 +35,6 @@ class TestMainConnector : public QObject
 
 private Q_SLOTS:
     void init();
-    void cleanup();
     void versionRule_data();
     void versionRule();
     void opensTheStandingRecordsets();
@@ -62,11 +61,6 @@ void TestMainConnector::init()
 {
     m_workspace = std::make_unique<TestWorkspace>();
     QVERIFY(m_workspace->configure());
-}
-
-void TestMainConnector::cleanup()
-{
-    m_workspace.reset();
 }
 
 void TestMainConnector::versionRule_data()
