@@ -3,7 +3,6 @@
 
 #include "database/recordoperations.h"
 
-#include <QSqlQuery>
 #include <QTest>
 
 using namespace Qt::StringLiterals;
@@ -28,13 +27,6 @@ private:
     RecordOperations operations()
     {
         return RecordOperations(m_workspace->context().mainDatabase(), m_workspace->prompter());
-    }
-    void addUser(const QString &name)
-    {
-        QSqlQuery query(m_workspace->context().mainDatabase().database());
-        query.prepare(u"INSERT INTO Users (UserName, Password) VALUES (?, 'pw')"_s);
-        query.addBindValue(name);
-        QVERIFY(query.exec());
     }
 
     std::unique_ptr<TestWorkspace> m_workspace;
@@ -141,7 +133,8 @@ void TestRecordOperations::valueExists()
     QFETCH(QString, stored);
     QFETCH(QString, asked);
     QFETCH(bool, exists);
-    addUser(stored);
+    QVERIFY(
+        m_workspace->exec(u"INSERT INTO Users (UserName, Password) VALUES (?, 'pw')"_s, {stored}));
     QCOMPARE(operations().valueExists(u"Users"_s, u"UserName"_s, asked), exists);
     QCOMPARE(operations().valueExists(u"Users"_s, u"UserName"_s, stored), true);
 }
