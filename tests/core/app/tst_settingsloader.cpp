@@ -34,7 +34,6 @@ private Q_SLOTS:
     void derivesProgramPaths();
     void createsMainDatabaseFromTemplateOnce();
     void templateFoundInLaterCandidate();
-    void unwritableDatabaseFolderShowsNoMessage();
     void deciphersThePassword_data();
     void deciphersThePassword();
 
@@ -62,32 +61,35 @@ void TestSettingsLoader::init()
 
 void TestSettingsLoader::checksInOrder_data()
 {
-    QTest::addColumn<QString>("dbPath"); // "<shared>" stands for an existing folder
+    QTest::addColumn<QString>("dbPath"); // "<shared>": an existing folder; "<file>": a file
     QTest::addColumn<QString>("package");
     QTest::addColumn<QString>("driver");
-    QTest::addColumn<bool>("mainDatabaseExists");
+    QTest::addColumn<QString>("database"); // main.db in the folder, new.db beside the program
     QTest::addColumn<QString>("expected");
 
-    QTest::newRow("empty store") << QString() << QString() << QString() << false << SpecifyPackage;
+    // An empty store is the start-up test's fresh install.
     QTest::newRow("missing folder before anything else")
-        << u"/no/such/folder"_s << QString() << QString() << true << ConfigureDatabasePath;
+        << u"/no/such/folder"_s << QString() << QString() << u"main.db"_s << ConfigureDatabasePath;
     QTest::newRow("package in lower case")
-        << u"<shared>"_s << u"myob"_s << u"MYOAU0901"_s << true << SpecifyPackage;
+        << u"<shared>"_s << u"myob"_s << u"MYOAU0901"_s << u"main.db"_s << SpecifyPackage;
     QTest::newRow("unknown package")
-        << u"<shared>"_s << u"QuickBooks"_s << QString() << true << SpecifyPackage;
+        << u"<shared>"_s << u"QuickBooks"_s << QString() << u"main.db"_s << SpecifyPackage;
     QTest::newRow("MYOB without driver")
-        << u"<shared>"_s << u"MYOB"_s << QString() << true << SpecifyDriver;
+        << u"<shared>"_s << u"MYOB"_s << QString() << u"main.db"_s << SpecifyDriver;
     QTest::newRow("MoneyWorks without driver")
-        << u"<shared>"_s << u"MoneyWorks"_s << QString() << true << QString();
+        << u"<shared>"_s << u"MoneyWorks"_s << QString() << u"main.db"_s << QString();
     QTest::newRow("MYOB with driver")
-        << u"<shared>"_s << u"MYOB"_s << u"SQLite"_s << true << QString();
+        << u"<shared>"_s << u"MYOB"_s << u"SQLite"_s << u"main.db"_s << QString();
     QTest::newRow("settings fine, no database, no template")
-        << u"<shared>"_s << u"MYOB"_s << u"MYOAU0901"_s << false << DatabaseMissing;
+        << u"<shared>"_s << u"MYOB"_s << u"MYOAU0901"_s << QString() << DatabaseMissing;
     QTest::newRow("default path is the program folder")
-        << QString() << u"MoneyWorks"_s << QString() << false << DatabaseMissing;
+        << QString() << u"MoneyWorks"_s << QString() << QString() << DatabaseMissing;
     QTest::newRow("path too long to hold is not replaced by the default")
-        << u"/"_s + QString(1000, u'x') << u"MoneyWorks"_s << QString() << false
+        << u"/"_s + QString(1000, u'x') << u"MoneyWorks"_s << QString() << QString()
         << DatabasePathTooLong;
+    // Nothing can be created under a file, even by root: no copy of the template, no message.
+    QTest::newRow("a file where the folder should be")
+        << u"<file>"_s << u"MoneyWorks"_s << QString() << u"new.db"_s << DatabaseMissing;
 }
 
 void TestSettingsLoader::checksInOrder()
@@ -95,15 +97,17 @@ void TestSettingsLoader::checksInOrder()
     QFETCH(QString, dbPath);
     QFETCH(QString, package);
     QFETCH(QString, driver);
-    QFETCH(bool, mainDatabaseExists);
+    QFETCH(QString, database);
     QFETCH(QString, expected);
 
-    dbPath.replace(u"<shared>"_s, dataFolder());
+    touch(m_workspace->path(u"plain-file"_s));
+    dbPath.replace(u"<shared>"_s, dataFolder())
+        .replace(u"<file>"_s, m_workspace->path(u"plain-file"_s));
     store().writeSetting(u"DBPath"_s, dbPath);
     store().writeSetting(u"AccPackage"_s, package);
     store().writeSetting(u"AccFileDriver"_s, driver);
-    if (mainDatabaseExists)
-        touch(m_workspace->mainDatabase());
+    if (!database.isEmpty())
+        touch((database == u"main.db"_s ? dataFolder() : appFolder()) + database);
 
     QCOMPARE(loadSettings(context()), expected);
     QVERIFY(m_workspace->prompter().messages().isEmpty());
@@ -176,18 +180,6 @@ void TestSettingsLoader::templateFoundInLaterCandidate()
     QCOMPARE(loadSettings(*other), QString());
     QCOMPARE(other->settings().newDatabaseFile, installed);
     QVERIFY(QFileInfo::exists(appFolder() + u"main.db"_s));
-}
-
-void TestSettingsLoader::unwritableDatabaseFolderShowsNoMessage()
-{
-    QVERIFY(m_workspace->configure());
-    // A file where the folder should be: nothing can be created under it, even by root.
-    const QString notAFolder = m_workspace->path(u"plain-file"_s);
-    touch(notAFolder);
-    store().writeSetting(u"DBPath"_s, notAFolder);
-
-    QCOMPARE(loadSettings(context()), DatabaseMissing);
-    QVERIFY(m_workspace->prompter().messages().isEmpty());
 }
 
 void TestSettingsLoader::deciphersThePassword_data()
