@@ -25,7 +25,6 @@ private Q_SLOTS:
     void checksInOrder();
     void savesEverythingWithThePasswordEnciphered();
     void unknownPackageIsWrittenBackAsItWas();
-    void fileFilters();
 };
 
 void TestSystemConfiguration::checksInOrder_data()
@@ -133,14 +132,6 @@ void TestSystemConfiguration::unknownPackageIsWrittenBackAsItWas()
     QVERIFY(configuration.save(values));
     QCOMPARE(workspace.store().readSetting(u"AccPackage"_s), u"myob"_s);
     QCOMPARE(loadSettings(workspace.context()), u"Your accounting package must be specified!"_s);
-}
-
-void TestSystemConfiguration::fileFilters()
-{
-    QVERIFY(SystemConfiguration::fileFilter(u"MoneyWorks"_s).startsWith(u"MoneyWorks Files ("_s));
-    QVERIFY(
-        SystemConfiguration::fileFilter(u"MYOB"_s).contains(u"*.myo *.myb *.dat *.pls *.prm"_s));
-    QVERIFY(SystemConfiguration::driverNames().contains(u"SQLite"_s));
 }
 
 QTEST_GUILESS_MAIN(TestSystemConfiguration)
