@@ -46,17 +46,6 @@ QString randomSingleByteText(QRandomGenerator &random)
     return Windows1252::toUnicode(bytes);
 }
 
-// Stored values come from a settings store anyone can edit. Whatever is in there, decrypting
-// it must end: either with the password or with an error and the value handed back as it was.
-void decryptSafely(PasswordCipher &cipher, const QString &stored)
-{
-    const QString result = cipher.decryptText(stored, Key);
-    if (cipher.cryptoError() != PasswordCipher::NoError)
-        QCOMPARE(result, stored);
-    else
-        QVERIFY(cipher.cryptoErrorMessage().isEmpty());
-}
-
 } // namespace
 
 class TestPasswordCipher : public QObject
@@ -334,10 +323,12 @@ void TestPasswordCipher::arbitraryStoredValues()
                 break;
             }
         }
-        decryptSafely(cipher, stored);
-        if (QTest::currentTestFailed())
-            return;
-        if (i >= 5000 && cipher.cryptoError() == PasswordCipher::NoError)
+        // Stored values come from a settings store anyone can edit. Whatever is in there,
+        // decrypting it must end: with the password, or with an error and the value as it was.
+        const QString result = cipher.decryptText(stored, Key);
+        if (cipher.cryptoError() != PasswordCipher::NoError)
+            QCOMPARE(result, stored);
+        else if (i >= 5000)
             ++decodedAnyway;
     }
     // Damage to the header only still decodes; everything else must be caught.
