@@ -56,7 +56,7 @@ private Q_SLOTS:
     void roundTripsThousandsOfTextsOnlyUnderTheirKey();
     void decryptsValuesWrittenElsewhere_data();
     void decryptsValuesWrittenElsewhere();
-    void keyStreamMatchesItsDefinition();
+    void secondKeyChangesTheStream();
     void failedDecryptionReturnsInputUnchanged_data();
     void failedDecryptionReturnsInputUnchanged();
     void keyUsability_data();
@@ -117,13 +117,9 @@ void TestPasswordCipher::decryptsValuesWrittenElsewhere()
     QCOMPARE(cipher.cryptoErrorMessage(), QString());
 }
 
-void TestPasswordCipher::keyStreamMatchesItsDefinition()
+void TestPasswordCipher::secondKeyChangesTheStream()
 {
-    // Sixteen zero bytes enciphered: the stream itself, fed back byte by byte.
-    KeyStream stream(QByteArrayLiteral("Rv5HnW2j"), {});
-    QCOMPARE(stream.encipher(QByteArray(16, '\0')).toHex(),
-             QByteArrayLiteral("3100706a5fdf923be7394760d7f3281c"));
-    // A second key changes the stream.
+    // The stream of one key is proven by the values written elsewhere; a second key changes it.
     const QByteArray framed =
         fixedHeader() + QByteArrayLiteral("HE0\rCaf\xe9") + fixedHeader().right(2);
     const QByteArray written = Base64Armour::decode(
