@@ -5,7 +5,6 @@
 #include "database/configvalues.h"
 #include "users/loginsession.h"
 
-#include <QSqlQuery>
 #include <QTest>
 
 using namespace Qt::StringLiterals;
@@ -33,9 +32,8 @@ void TestLoginSession::init()
     m_workspace = std::make_unique<TestWorkspace>();
     QVERIFY(m_workspace->configure());
     QVERIFY(m_workspace->connect());
-    QVERIFY(QSqlQuery(m_workspace->context().mainDatabase().database())
-                .exec(u"INSERT INTO Users (UserName, Password, Type, Fields) "
-                      u"VALUES ('bob', 'pw', 0, '1,2')"_s));
+    QVERIFY(m_workspace->exec(u"INSERT INTO Users (UserName, Password, Type, Fields) "
+                              u"VALUES ('bob', 'pw', 0, '1,2')"_s));
 }
 
 // The built-in account is never counted: the main window's log-in table shows it.
