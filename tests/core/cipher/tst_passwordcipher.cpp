@@ -285,46 +285,36 @@ void TestPasswordCipher::armourBreaksLongLines()
 
 void TestPasswordCipher::arbitraryStoredValues()
 {
-    static const QString Base64Characters =
-        u"ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/= \r\n"_s;
     QRandomGenerator random(1);
     PasswordCipher cipher(&random);
-    // Random Base64 text first, then real values damaged: characters flipped, cut short, or a
-    // piece of another value grafted on.
+    // Real values damaged: characters flipped (to any Base64 character, '=' or others), cut
+    // short, or a piece of another value grafted on.
     int decodedAnyway = 0;
-    for (int i = 0; i < 10000; ++i) {
-        QString stored;
-        if (i < 5000) {
-            const int length = int(random.bounded(400));
-            for (int k = 0; k < length; ++k)
-                stored.append(Base64Characters.at(random.bounded(Base64Characters.size())));
-        } else {
-            QString password;
-            const int length = 1 + int(random.bounded(40));
-            for (int k = 0; k < length; ++k)
-                password.append(QChar(char16_t(0x20 + random.bounded(0x5F))));
-            stored = cipher.encryptText(password, Key);
-            switch (random.bounded(3)) {
-            case 0:
-                for (int flips = 1 + int(random.bounded(3)); flips > 0; --flips)
-                    stored[random.bounded(stored.size())] =
-                        QChar(char16_t(0x2B + random.bounded(0x50)));
-                break;
-            case 1:
-                stored.truncate(random.bounded(stored.size()));
-                break;
-            default:
-                stored.insert(random.bounded(stored.size()),
-                              cipher.encryptText(u"x"_s, Key).left(8));
-                break;
-            }
+    for (int i = 0; i < 5000; ++i) {
+        QString password;
+        const int length = 1 + int(random.bounded(40));
+        for (int k = 0; k < length; ++k)
+            password.append(QChar(char16_t(0x20 + random.bounded(0x5F))));
+        QString stored = cipher.encryptText(password, Key);
+        switch (random.bounded(3)) {
+        case 0:
+            for (int flips = 1 + int(random.bounded(3)); flips > 0; --flips)
+                stored[random.bounded(stored.size())] =
+                    QChar(char16_t(0x2B + random.bounded(0x50)));
+            break;
+        case 1:
+            stored.truncate(random.bounded(stored.size()));
+            break;
+        default:
+            stored.insert(random.bounded(stored.size()), cipher.encryptText(u"x"_s, Key).left(8));
+            break;
         }
         // Stored values come from a settings store anyone can edit. Whatever is in there,
         // decrypting it must end: with the password, or with an error and the value as it was.
         const QString result = cipher.decryptText(stored, Key);
         if (cipher.cryptoError() != PasswordCipher::NoError)
             QCOMPARE(result, stored);
-        else if (i >= 5000)
+        else
             ++decodedAnyway;
     }
     // Damage to the header only still decodes; everything else must be caught.
