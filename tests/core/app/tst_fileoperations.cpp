@@ -39,10 +39,9 @@ private Q_SLOTS:
     void init();
     void addTrailingSlash_data();
     void addTrailingSlash();
-    void fileExistsAnswers();
+    void fileExistsAndEmptyFiles();
     void folderExistsAnswers();
     void copyFileRespectsOverwrite();
-    void createEmptyTextFile();
     void writeAndReadText_data();
     void writeAndReadText();
     void writeTextFile();
@@ -84,7 +83,7 @@ void TestFileOperations::addTrailingSlash()
     QCOMPARE(FileOperations::addTrailingSlash(path), expected);
 }
 
-void TestFileOperations::fileExistsAnswers()
+void TestFileOperations::fileExistsAndEmptyFiles()
 {
     writeFile(path(u".hidden"_s));
     writeFile(path(u"readonly"_s));
@@ -110,6 +109,16 @@ void TestFileOperations::fileExistsAnswers()
     QCOMPARE(QFileInfo(missing).size(), 0);
     QVERIFY(fileExists(missing, {&m_prompter, {}, true}));
     QCOMPARE(m_prompter.messages().size(), 1);
+
+    // An empty text file is made where there is none, and over one only when told to.
+    const QString jobs = path(u"jobs.inf"_s);
+    createEmptyTextFile(jobs, false);
+    QVERIFY(QFileInfo(jobs).isFile());
+    writeFile(jobs, "kept");
+    createEmptyTextFile(jobs, false);
+    QCOMPARE(contentOf(jobs), QByteArray("kept"));
+    createEmptyTextFile(jobs, true);
+    QCOMPARE(QFileInfo(jobs).size(), 0);
 }
 
 void TestFileOperations::folderExistsAnswers()
@@ -160,18 +169,6 @@ void TestFileOperations::copyFileRespectsOverwrite()
     QVERIFY(copied);
     QCOMPARE(QFile::permissions(target) & 0x0FFF, QFileDevice::ReadUser | QFileDevice::WriteUser);
 #endif
-}
-
-void TestFileOperations::createEmptyTextFile()
-{
-    const QString file = path(u"jobs.inf"_s);
-    FileOperations::createEmptyTextFile(file, false);
-    QCOMPARE(QFileInfo(file).size(), 0);
-    writeFile(file, "kept");
-    FileOperations::createEmptyTextFile(file, false);
-    QCOMPARE(contentOf(file), QByteArray("kept"));
-    FileOperations::createEmptyTextFile(file, true);
-    QCOMPARE(QFileInfo(file).size(), 0);
 }
 
 void TestFileOperations::writeAndReadText_data()
