@@ -16,8 +16,6 @@ class TestNumberFormat : public QObject
     Q_OBJECT
 
 private Q_SLOTS:
-    void initTestCase();
-    void cleanupTestCase();
     void formatMoney_data();
     void formatMoney();
     void toNumber_data();
@@ -25,20 +23,7 @@ private Q_SLOTS:
     void readsBackWhatItWrites_data();
     void readsBackWhatItWrites();
     void bareServerLocaleMeansAustralia();
-
-private:
-    QLocale m_savedDefault;
 };
-
-void TestNumberFormat::initTestCase()
-{
-    m_savedDefault = QLocale();
-}
-
-void TestNumberFormat::cleanupTestCase()
-{
-    QLocale::setDefault(m_savedDefault);
-}
 
 void TestNumberFormat::formatMoney_data()
 {
