@@ -48,11 +48,6 @@ private Q_SLOTS:
 
 private:
     AppContext &context() { return m_workspace->context(); }
-    QString connectAfterSettings()
-    {
-        const QString problem = loadSettings(context());
-        return problem.isEmpty() ? connectMainDatabase(context()) : problem;
-    }
 
     std::unique_ptr<TestWorkspace> m_workspace;
 };
@@ -61,6 +56,7 @@ void TestMainConnector::init()
 {
     m_workspace = std::make_unique<TestWorkspace>();
     QVERIFY(m_workspace->configure());
+    QCOMPARE(loadSettings(context()), QString()); // main.db made, not yet connected
 }
 
 void TestMainConnector::versionRule_data()
@@ -90,7 +86,7 @@ void TestMainConnector::versionRule()
 
 void TestMainConnector::opensTheStandingRecordsets()
 {
-    QCOMPARE(connectAfterSettings(), QString());
+    QCOMPARE(connectMainDatabase(context()), QString());
     MainDatabase &database = context().mainDatabase();
     QVERIFY(database.isConnected());
     QCOMPARE(database.configRecordset().recordCount(), 4);
@@ -144,7 +140,7 @@ void TestMainConnector::cacheFile()
     QFETCH(QStringList, values);
     writeFile(m_workspace->appFolder() + u"data.db"_s, content);
 
-    QCOMPARE(connectAfterSettings(), expected);
+    QCOMPARE(connectMainDatabase(context()), expected);
     const PeriodDataSet::Slot &slot = context().periodDataSet().slot(0);
     QCOMPARE(slot.fieldIds, ids);
     QCOMPARE(slot.fieldValues, values);
@@ -198,7 +194,6 @@ void TestMainConnector::unusableDatabase()
     QFETCH(QByteArray, content);
     QFETCH(QString, sql);
     QFETCH(QString, expected);
-    QCOMPARE(loadSettings(context()), QString());
     for (const QString &statement : sql.split(u';', Qt::SkipEmptyParts))
         QVERIFY(m_workspace->exec(statement));
     if (sql.isEmpty())
@@ -215,7 +210,6 @@ void TestMainConnector::unusableDatabase()
 
 void TestMainConnector::lockedDatabaseFails()
 {
-    QCOMPARE(loadSettings(context()), QString());
     SqliteConnection other;
     QCOMPARE(other.open(m_workspace->mainDatabase()), std::nullopt);
     QSqlQuery lock(other.database());
@@ -231,7 +225,6 @@ void TestMainConnector::lockedDatabaseFails()
 
 void TestMainConnector::missingConfigRowIsReportedOnEveryAccess()
 {
-    QCOMPARE(loadSettings(context()), QString());
     QVERIFY(m_workspace->setConfigRow(1, u"1.55"_s));
     QVERIFY(m_workspace->exec(u"DELETE FROM Config WHERE ID = 2"_s));
     m_workspace->prompter().clearMessages();
@@ -255,7 +248,6 @@ void TestMainConnector::missingConfigRowIsReportedOnEveryAccess()
 
 void TestMainConnector::twoProcessesWriteConfigTogether()
 {
-    QCOMPARE(loadSettings(context()), QString());
     QProcess first;
     QProcess second;
     const QString helper = QStringLiteral(VELTRIX_TEST_HELPER);
