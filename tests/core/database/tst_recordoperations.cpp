@@ -54,8 +54,11 @@ void TestRecordOperations::openQuery()
     RecordOperations::Query unopened = operations().openQuery(u"Hours"_s, QString(), false);
     QVERIFY(!unopened.records.isOpen());
 
+    // A query that cannot open says why and leaves no records.
     RecordOperations::Query broken = operations().openQuery(u"Nowhere"_s, QString(), true);
     QVERIFY(broken.error);
+    QVERIFY(!broken.error->description.isEmpty());
+    QVERIFY(!broken.records.isOpen());
 }
 
 void TestRecordOperations::findRecordById_data()
