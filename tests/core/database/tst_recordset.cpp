@@ -19,8 +19,6 @@ private Q_SLOTS:
     void changeByAnotherCopy_data();
     void changeByAnotherCopy();
     void readOnlyAndJoinedQueriesRefuseChanges();
-    void openFailures_data();
-    void openFailures();
 
 private:
     QSqlDatabase first() { return m_workspace->context().mainDatabase().database(); }
@@ -151,24 +149,6 @@ void TestRecordSet::readOnlyAndJoinedQueriesRefuseChanges()
     RecordSet joined(first(), u"SELECT h.ID, h.Value, c.Value AS c FROM Hours h, Config c"_s);
     QCOMPARE(joined.open(), std::nullopt);
     QVERIFY(joined.setValue(u"Value"_s, 1).has_value());
-}
-
-void TestRecordSet::openFailures_data()
-{
-    QTest::addColumn<QString>("sql");
-    QTest::newRow("missing table") << u"SELECT * FROM Nowhere"_s;
-    QTest::newRow("bad SQL") << u"SELEC * FROM Config"_s;
-    QTest::newRow("missing column") << u"SELECT Nothing FROM Config"_s;
-}
-
-void TestRecordSet::openFailures()
-{
-    QFETCH(QString, sql);
-    RecordSet records(first(), sql);
-    const std::optional<DbError> error = records.open();
-    QVERIFY(error);
-    QVERIFY(!error->description.isEmpty());
-    QVERIFY(!records.isOpen());
 }
 
 QTEST_GUILESS_MAIN(TestRecordSet)
