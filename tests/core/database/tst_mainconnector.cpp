@@ -172,7 +172,6 @@ void TestMainConnector::unusableDatabase_data()
         << QByteArray("This is a spreadsheet, not a database.") << QString() << ConnectionFailed;
     QTest::newRow("empty file") << QByteArray("") << QString() << ConnectionFailed;
     QTest::newRow("without Fields") << QByteArray() << u"DROP TABLE Fields"_s << ConnectionFailed;
-    QTest::newRow("without Config") << QByteArray() << u"DROP TABLE Config"_s << ConnectionFailed;
     // Another tool renamed a column: every figure, rate or login would read as empty.
     QTest::newRow("Fields.Data renamed")
         << QByteArray() << u"ALTER TABLE Fields RENAME COLUMN Data TO Account"_s
@@ -182,9 +181,6 @@ void TestMainConnector::unusableDatabase_data()
         << u"ALTER TABLE Hours RENAME COLUMN Value TO Rate;"
            u"ALTER TABLE Users RENAME COLUMN Fields TO Lines"_s
         << SchemaCheck::refusal({u"Users.Fields"_s, u"Hours.Value"_s});
-    QTest::newRow("Fields.tooltip dropped")
-        << QByteArray() << u"ALTER TABLE Fields DROP COLUMN tooltip"_s
-        << SchemaCheck::refusal({u"Fields.tooltip"_s});
     QTest::newRow("a column in another case is the same column")
         << QByteArray() << u"ALTER TABLE Hours RENAME COLUMN Value TO VALUE"_s << QString();
 }
