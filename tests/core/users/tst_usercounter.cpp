@@ -74,8 +74,6 @@ void TestUserCounter::pollActsOnceAndWithdrawsTheRequest_data()
     QTest::newRow("disconnect") << u"Disconnect"_s << UserPoll::Action::Disconnect << false;
     QTest::newRow("something else") << u"Reboot"_s << UserPoll::Action::None << false;
     QTest::newRow("shut down during a load") << u"Shutdown"_s << UserPoll::Action::Shutdown << true;
-    QTest::newRow("disconnect during a load")
-        << u"Disconnect"_s << UserPoll::Action::Disconnect << true;
 }
 
 void TestUserCounter::pollActsOnceAndWithdrawsTheRequest()
