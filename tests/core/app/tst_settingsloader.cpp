@@ -189,7 +189,6 @@ void TestSettingsLoader::deciphersThePassword_data()
     const QString enciphered = PasswordCipher().encryptText(u"Sp@nner 7"_s, Settings::PasswordKey);
     QTest::newRow("enciphered") << enciphered << u"Sp@nner 7"_s;
     QTest::newRow("typed in clear") << u"plainpass"_s << u"plainpass"_s;
-    QTest::newRow("empty") << QString() << QString();
 }
 
 void TestSettingsLoader::deciphersThePassword()
