@@ -30,9 +30,6 @@ void TestErrorReporter::reports_data()
     QTest::newRow("database unreachable")
         << -2147467259 << u"Disk or network error."_s << u"Connection"_s << communication
         << u"Communication Error"_s;
-    QTest::newRow("database unreachable, no description")
-        << -2147467259 << QString() << u"Find Record"_s << communication
-        << u"Communication Error"_s;
     QTest::newRow("ordinary error")
         << 3021 << u"No current record."_s << u"Find Record"_s
         << u"Error 3021\r\n\r\nNo current record."_s << u"Find Record Error 3021"_s;
