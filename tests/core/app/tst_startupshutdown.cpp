@@ -62,7 +62,6 @@ void TestStartupShutdown::appVersion_data()
     QTest::addColumn<int>("revision");
     QTest::addColumn<QString>("expected");
     QTest::newRow("1.5.5") << 1 << 5 << 5 << u"1.55"_s;
-    QTest::newRow("2.0.0") << 2 << 0 << 0 << u"2.00"_s;
     QTest::newRow("1.1.12") << 1 << 1 << 12 << u"1.11"_s;
 }
 
