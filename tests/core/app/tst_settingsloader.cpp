@@ -117,11 +117,10 @@ void TestSettingsLoader::derivesProgramPaths()
 {
     loadSettings(context());
     const Settings &settings = context().settings();
-    const QString sep = QDir::separator();
     QCOMPARE(settings.appFolder, appFolder());
     QCOMPARE(settings.newDatabaseFile, appFolder() + u"new.db"_s);
     QCOMPARE(settings.cacheFile, appFolder() + u"data.db"_s);
-    QCOMPARE(settings.tempFolder, appFolder() + u"temp"_s + sep);
+    QCOMPARE(settings.tempFolder, appFolder() + u"temp"_s + QDir::separator());
     QCOMPARE(settings.tempHtmlFile, settings.tempFolder + u"tmp.html"_s);
     QCOMPARE(settings.tempGifFile, settings.tempFolder + u"tmp.gif"_s);
     QCOMPARE(settings.tempBmpFile, settings.tempFolder + u"tmp.bmp"_s);
