@@ -39,17 +39,15 @@ private Q_SLOTS:
     void init();
     void addTrailingSlash_data();
     void addTrailingSlash();
-    void fileExistsAnswers();
+    void fileExistsAndEmptyFiles();
     void folderExistsAnswers();
     void copyFileRespectsOverwrite();
-    void createEmptyTextFile();
     void writeAndReadText_data();
     void writeAndReadText();
     void writeTextFile();
     void deleteFolderTreeRemovesEverything();
     void deleteFolderTreeRefuses_data();
     void deleteFolderTreeRefuses();
-    void clearFolder();
 
 private:
     QString path(const QString &name) const { return m_dir->filePath(name); }
@@ -85,7 +83,7 @@ void TestFileOperations::addTrailingSlash()
     QCOMPARE(FileOperations::addTrailingSlash(path), expected);
 }
 
-void TestFileOperations::fileExistsAnswers()
+void TestFileOperations::fileExistsAndEmptyFiles()
 {
     writeFile(path(u".hidden"_s));
     writeFile(path(u"readonly"_s));
@@ -111,6 +109,16 @@ void TestFileOperations::fileExistsAnswers()
     QCOMPARE(QFileInfo(missing).size(), 0);
     QVERIFY(fileExists(missing, {&m_prompter, {}, true}));
     QCOMPARE(m_prompter.messages().size(), 1);
+
+    // An empty text file is made where there is none, and over one only when told to.
+    const QString jobs = path(u"jobs.inf"_s);
+    createEmptyTextFile(jobs, false);
+    QVERIFY(QFileInfo(jobs).isFile());
+    writeFile(jobs, "kept");
+    createEmptyTextFile(jobs, false);
+    QCOMPARE(contentOf(jobs), QByteArray("kept"));
+    createEmptyTextFile(jobs, true);
+    QCOMPARE(QFileInfo(jobs).size(), 0);
 }
 
 void TestFileOperations::folderExistsAnswers()
@@ -161,18 +169,6 @@ void TestFileOperations::copyFileRespectsOverwrite()
     QVERIFY(copied);
     QCOMPARE(QFile::permissions(target) & 0x0FFF, QFileDevice::ReadUser | QFileDevice::WriteUser);
 #endif
-}
-
-void TestFileOperations::createEmptyTextFile()
-{
-    const QString file = path(u"jobs.inf"_s);
-    FileOperations::createEmptyTextFile(file, false);
-    QCOMPARE(QFileInfo(file).size(), 0);
-    writeFile(file, "kept");
-    FileOperations::createEmptyTextFile(file, false);
-    QCOMPARE(contentOf(file), QByteArray("kept"));
-    FileOperations::createEmptyTextFile(file, true);
-    QCOMPARE(QFileInfo(file).size(), 0);
 }
 
 void TestFileOperations::writeAndReadText_data()
@@ -237,6 +233,11 @@ void TestFileOperations::deleteFolderTreeRemovesEverything()
     QCOMPARE(deleteFolderTree(u"  "_s + root + u"/  "_s), 0);
     QVERIFY(!QFileInfo::exists(root));
     QVERIFY(QFileInfo(m_dir->path()).isDir());
+    QVERIFY(clearFolder(root)); // nothing left to clear
+    // Deleted through a link, only the link goes.
+    QVERIFY(QFile::link(outside, root));
+    QVERIFY(clearFolder(root));
+    QVERIFY(!QFileInfo(root).isSymLink());
     QCOMPARE(contentOf(outside + u"/ledger.db"_s), QByteArray("keep me"));
     QCOMPARE(contentOf(outside + u"/inner/notes.txt"_s), QByteArray("keep me too"));
 }
@@ -259,25 +260,6 @@ void TestFileOperations::deleteFolderTreeRefuses()
     target.replace(u"<dir>"_s, m_dir->path());
     QCOMPARE(deleteFolderTree(target), -1);
     QVERIFY(QFileInfo::exists(path(u"file.txt"_s)));
-}
-
-void TestFileOperations::clearFolder()
-{
-    const QString root = path(u"temp"_s);
-    QVERIFY(FileOperations::clearFolder(root)); // nothing to clear
-    QVERIFY(QDir().mkpath(root + u"/a"_s));
-    writeFile(root + u"/a/tmp.gif"_s);
-    QVERIFY(FileOperations::clearFolder(root));
-    QVERIFY(!QFileInfo::exists(root));
-
-    // Cleared through a link, only the link goes.
-    const QString outside = path(u"precious"_s);
-    QVERIFY(QDir().mkpath(outside));
-    writeFile(outside + u"/ledger.db"_s, "keep me");
-    QVERIFY(QFile::link(outside, root));
-    QVERIFY(FileOperations::clearFolder(root));
-    QVERIFY(!QFileInfo(root).isSymLink());
-    QCOMPARE(contentOf(outside + u"/ledger.db"_s), QByteArray("keep me"));
 }
 
 QTEST_GUILESS_MAIN(TestFileOperations)

@@ -31,6 +31,15 @@ private:
     int &m_disconnects;
 };
 
+// A workspace started up as the program does.
+std::unique_ptr<TestWorkspace> startedWorkspace()
+{
+    auto workspace = std::make_unique<TestWorkspace>();
+    if (!workspace->configure() || runStartupSequence(workspace->context()).failed)
+        return nullptr;
+    return workspace;
+}
+
 } // namespace
 
 class TestStartupShutdown : public QObject
@@ -42,10 +51,8 @@ private Q_SLOTS:
     void appVersion();
     void outcomes_data();
     void outcomes();
-    void shutDownKeepsSlotZero();
-    void shutDownWithEmptySlotKeepsOldCache();
+    void shutDownKeepsSlotZeroForTheNextStart();
     void shutDownLogsOffOnlyALoggedInUser();
-    void cacheWrittenAtShutDownIsReadAtNextStart();
 };
 
 void TestStartupShutdown::appVersion_data()
@@ -55,7 +62,6 @@ void TestStartupShutdown::appVersion_data()
     QTest::addColumn<int>("revision");
     QTest::addColumn<QString>("expected");
     QTest::newRow("1.5.5") << 1 << 5 << 5 << u"1.55"_s;
-    QTest::newRow("2.0.0") << 2 << 0 << 0 << u"2.00"_s;
     QTest::newRow("1.1.12") << 1 << 1 << 12 << u"1.11"_s;
 }
 
@@ -66,7 +72,6 @@ void TestStartupShutdown::appVersion()
     QFETCH(int, revision);
     QFETCH(QString, expected);
     QCOMPARE(AppInfo::appVersionFrom(major, minor, revision), expected);
-    QCOMPARE(AppInfo::appVersion(), u"1.55"_s);
 }
 
 void TestStartupShutdown::outcomes_data()
@@ -106,12 +111,11 @@ void TestStartupShutdown::outcomes()
     QCOMPARE(workspace.context().mainDatabase().isConnected(), message.isEmpty());
 }
 
-void TestStartupShutdown::shutDownKeepsSlotZero()
+void TestStartupShutdown::shutDownKeepsSlotZeroForTheNextStart()
 {
-    TestWorkspace workspace;
-    QVERIFY(workspace.configure());
-    QVERIFY(!runStartupSequence(workspace.context()).failed);
-    AppContext &context = workspace.context();
+    const auto workspace = startedWorkspace();
+    QVERIFY(workspace);
+    AppContext &context = workspace->context();
     int disconnects = 0;
     context.setAccountingSource(std::make_unique<CountingSource>(disconnects));
     PeriodDataSet &data = context.periodDataSet();
@@ -129,51 +133,29 @@ void TestStartupShutdown::shutDownKeepsSlotZero()
     QVERIFY(!context.mainDatabase().isConnected());
     QCOMPARE(disconnects, 1);
     QVERIFY(!QFileInfo::exists(context.settings().tempFolder));
-}
 
-void TestStartupShutdown::shutDownWithEmptySlotKeepsOldCache()
-{
-    TestWorkspace workspace;
-    QVERIFY(workspace.configure());
-    QVERIFY(!runStartupSequence(workspace.context()).failed);
-    const QString cache = workspace.context().settings().cacheFile;
-    QVERIFY(!QFileInfo::exists(cache));
-    shutDown(workspace.context());
-    QVERIFY(!QFileInfo::exists(cache));
+    // The next start reads it back (types and signs survive: the cache file's own test).
+    data.slot(0) = PeriodDataSet::Slot();
+    data.setCurrentSlot(0);
+    QVERIFY(!runStartupSequence(context).failed);
+    QCOMPARE(data.getFieldValue(79), 1500.0);
 }
 
 void TestStartupShutdown::shutDownLogsOffOnlyALoggedInUser()
 {
     for (const bool loggedIn : {false, true}) {
-        TestWorkspace workspace;
-        QVERIFY(workspace.configure());
-        QVERIFY(!runStartupSequence(workspace.context()).failed);
-        QCOMPARE(ConfigValues(workspace.context().mainDatabase(), workspace.prompter())
-                     .setConfigValue(ConfigValues::UserCount, u"2"_s),
-                 std::nullopt);
-        workspace.context().loginState() = LoginState{loggedIn, u"bob"_s, 0, QString()};
-        shutDown(workspace.context());
-        QVERIFY(runStartupSequence(workspace.context()).message.isEmpty());
-        QCOMPARE(ConfigValues(workspace.context().mainDatabase(), workspace.prompter())
-                     .getConfigValue(ConfigValues::UserCount),
-                 loggedIn ? u"1"_s : u"2"_s);
+        const auto workspace = startedWorkspace();
+        QVERIFY(workspace);
+        AppContext &context = workspace->context();
+        const ConfigValues config(context.mainDatabase(), workspace->prompter());
+        QCOMPARE(config.setConfigValue(ConfigValues::UserCount, u"2"_s), std::nullopt);
+        context.loginState() = LoginState{loggedIn, u"bob"_s, 0, QString()};
+        shutDown(context);
+        // With nothing in slot 0, no cache file is written.
+        QVERIFY(!QFileInfo::exists(context.settings().cacheFile));
+        QVERIFY(runStartupSequence(context).message.isEmpty());
+        QCOMPARE(config.getConfigValue(ConfigValues::UserCount), loggedIn ? u"1"_s : u"2"_s);
     }
-}
-
-void TestStartupShutdown::cacheWrittenAtShutDownIsReadAtNextStart()
-{
-    TestWorkspace workspace;
-    QVERIFY(workspace.configure());
-    QVERIFY(!runStartupSequence(workspace.context()).failed);
-    workspace.context().periodDataSet().storeFieldValue(104, 0.1234, 1);
-    workspace.context().periodDataSet().storeAccountFigure(13, -5000.0, 2);
-    shutDown(workspace.context());
-
-    workspace.context().periodDataSet().slot(0) = PeriodDataSet::Slot();
-    QVERIFY(!runStartupSequence(workspace.context()).failed);
-    const PeriodDataSet &data = workspace.context().periodDataSet();
-    QCOMPARE(data.getFieldValue(104), 12.3);
-    QCOMPARE(data.getFieldValue(13), 5000.0);
 }
 
 QTEST_GUILESS_MAIN(TestStartupShutdown)

@@ -13,8 +13,6 @@ class TestWindowPlacement : public QObject
 
 private Q_SLOTS:
     void init();
-    void twipsPerPixel_data();
-    void twipsPerPixel();
     void savesNormalWindowInTwips_data();
     void savesNormalWindowInTwips();
     void maximisedAndMinimised();
@@ -34,39 +32,27 @@ void TestWindowPlacement::init()
     m_store = std::make_unique<SettingsStore>(m_dir->filePath(u"settings.ini"_s));
 }
 
-void TestWindowPlacement::twipsPerPixel_data()
-{
-    QTest::addColumn<double>("dpi");
-    QTest::addColumn<double>("twips");
-    QTest::newRow("96 dpi") << 96.0 << 15.0;
-    QTest::newRow("120 dpi") << 120.0 << 12.0;
-    QTest::newRow("144 dpi") << 144.0 << 10.0;
-    QTest::newRow("unknown") << 0.0 << 15.0;
-}
-
-void TestWindowPlacement::twipsPerPixel()
-{
-    QFETCH(double, dpi);
-    QFETCH(double, twips);
-    QCOMPARE(WindowPlacement::twipsPerPixelAt(dpi), twips);
-}
-
 void TestWindowPlacement::savesNormalWindowInTwips_data()
 {
-    QTest::addColumn<double>("twips"); // per pixel
+    QTest::addColumn<double>("dpi"); // of the screen the window is on
     QTest::addColumn<QRect>("geometry");
     QTest::addColumn<QStringList>("stored"); // left, top, width, height
-    QTest::newRow("96 dpi") << 15.0 << QRect(100, 50, 640, 480)
+    QTest::newRow("96 dpi") << 96.0 << QRect(100, 50, 640, 480)
                             << QStringList{u"1500"_s, u"750"_s, u"9600"_s, u"7200"_s};
-    QTest::newRow("144 dpi") << 10.0 << QRect(33, 44, 555, 666)
+    QTest::newRow("120 dpi") << 120.0 << QRect(10, 20, 30, 40)
+                             << QStringList{u"120"_s, u"240"_s, u"360"_s, u"480"_s};
+    QTest::newRow("144 dpi") << 144.0 << QRect(33, 44, 555, 666)
                              << QStringList{u"330"_s, u"440"_s, u"5550"_s, u"6660"_s};
+    QTest::newRow("unknown: as at 96")
+        << 0.0 << QRect(1, 2, 3, 4) << QStringList{u"15"_s, u"30"_s, u"45"_s, u"60"_s};
 }
 
 void TestWindowPlacement::savesNormalWindowInTwips()
 {
-    QFETCH(double, twips);
+    QFETCH(double, dpi);
     QFETCH(QRect, geometry);
     QFETCH(QStringList, stored);
+    const double twips = WindowPlacement::twipsPerPixelAt(dpi);
     WindowPlacement(*m_store, twips)
         .save(u"frmCompare"_s, geometry, WindowPlacement::State::Normal);
     QStringList written;

@@ -1,7 +1,6 @@
 // Veltrix — KPI dashboard for small businesses.
 #include "cipher/huffmancodec.h"
 
-#include <QRandomGenerator>
 #include <QTest>
 #include <QtEndian>
 
@@ -56,10 +55,8 @@ private Q_SLOTS:
     void roundTrips_data();
     void roundTrips();
     void writesTheDocumentedLayout();
-    void decodesCodesItDidNotChoose_data();
-    void decodesCodesItDidNotChoose();
-    void refusesDamagedContainers_data();
-    void refusesDamagedContainers();
+    void decodesWhatItIsGiven_data();
+    void decodesWhatItIsGiven();
 };
 
 void TestHuffmanCodec::roundTrips_data()
@@ -69,7 +66,6 @@ void TestHuffmanCodec::roundTrips_data()
     // Fewer than two distinct bytes cannot be coded: they are stored as they are.
     QTest::newRow("empty") << QByteArray() << QByteArray("HE0\r");
     QTest::newRow("one byte repeated") << QByteArray("zzzz") << QByteArray("HE0\r");
-    QTest::newRow("short password") << QByteArray("secret") << QByteArray("HE3\r");
     QTest::newRow("skewed frequencies")
         << QByteArray(1000, 'a') + QByteArray("bcdefgh") << QByteArray("HE3\r");
     QByteArray all;
@@ -78,11 +74,6 @@ void TestHuffmanCodec::roundTrips_data()
             all.append(char(b));
     }
     QTest::newRow("every byte value") << all << QByteArray("HE3\r");
-    QRandomGenerator random(3);
-    QByteArray text;
-    for (int i = 0; i < 20000; ++i)
-        text.append(char('a' + random.bounded(26) * random.bounded(2)));
-    QTest::newRow("long text") << text << QByteArray("HE3\r");
 }
 
 void TestHuffmanCodec::roundTrips()
@@ -118,68 +109,53 @@ void TestHuffmanCodec::writesTheDocumentedLayout()
     QCOMPARE(quint8(container[20]) & 0xFE, 0);
 }
 
-void TestHuffmanCodec::decodesCodesItDidNotChoose_data()
-{
-    QTest::addColumn<QByteArray>("plain");
-    QTest::addColumn<QByteArray>("container");
-    QTest::newRow("ones first") << QByteArray("secrete!")
-                                << codedContainer("secrete!", {{'e', "1"},
-                                                               {'c', "011"},
-                                                               {'r', "010"},
-                                                               {'t', "001"},
-                                                               {'s', "0001"},
-                                                               {'!', "0000"}});
-    QTest::newRow("lengths beyond need")
-        << QByteArray("abcab") << codedContainer("abcab", {{'a', "0"}, {'b', "10"}, {'c', "1110"}});
-    QTest::newRow("no data") << QByteArray() << codedContainer({}, {});
-}
-
-void TestHuffmanCodec::decodesCodesItDidNotChoose()
-{
-    QFETCH(QByteArray, plain);
-    QFETCH(QByteArray, container);
-    const HuffmanCodec::Decoded decoded = HuffmanCodec::decode(container);
-    QCOMPARE(decoded.status, HuffmanCodec::Status::Ok);
-    QCOMPARE(decoded.bytes, plain);
-}
-
-void TestHuffmanCodec::refusesDamagedContainers_data()
+void TestHuffmanCodec::decodesWhatItIsGiven_data()
 {
     QTest::addColumn<QByteArray>("container");
     QTest::addColumn<HuffmanCodec::Status>("status");
+    QTest::addColumn<QByteArray>("plain");
     const QMap<char, QByteArray> codes{{'a', "0"}, {'b', "10"}, {'c', "11"}};
     const QByteArray good = codedContainer("abcabc", codes);
+    using enum HuffmanCodec::Status;
 
-    QTest::newRow("unknown tag") << QByteArray("HE4\rabc") << HuffmanCodec::Status::NotIdentified;
-    QTest::newRow("too short for a tag") << QByteArray("HE") << HuffmanCodec::Status::NotIdentified;
-    QTest::newRow("header cut short") << good.left(9) << HuffmanCodec::Status::Corrupt;
-    QTest::newRow("table cut short") << good.left(13) << HuffmanCodec::Status::Corrupt;
-    QTest::newRow("data cut short") << good.left(good.size() - 1) << HuffmanCodec::Status::Corrupt;
+    // Codes this encoder would not choose are still read (a value written elsewhere with the
+    // ones first is among the stored values of the password cipher test).
+    QTest::newRow("lengths beyond need")
+        << codedContainer("abcab", {{'a', "0"}, {'b', "10"}, {'c', "1110"}}) << Ok
+        << QByteArray("abcab");
+    QTest::newRow("no data") << codedContainer({}, {}) << Ok << QByteArray();
+    QTest::newRow("unknown tag") << QByteArray("HE4\rabc") << NotIdentified << QByteArray();
+    QTest::newRow("too short for a tag") << QByteArray("HE") << NotIdentified << QByteArray();
+    QTest::newRow("header cut short") << good.left(9) << Corrupt << QByteArray();
+    QTest::newRow("table cut short") << good.left(13) << Corrupt << QByteArray();
+    QTest::newRow("data cut short") << good.left(good.size() - 1) << Corrupt << QByteArray();
     QTest::newRow("length far beyond the data")
-        << codedContainer("abcabc", codes, 0xFFFFFFFFu) << HuffmanCodec::Status::Corrupt;
+        << codedContainer("abcabc", codes, 0xFFFFFFFFu) << Corrupt << QByteArray();
     QTest::newRow("one code the prefix of another")
-        << codedContainer("ab", {{'a', "1"}, {'b', "10"}}) << HuffmanCodec::Status::Corrupt;
+        << codedContainer("ab", {{'a', "1"}, {'b', "10"}}) << Corrupt << QByteArray();
     QTest::newRow("two values with one code")
-        << codedContainer("ab", {{'a', "01"}, {'b', "01"}}) << HuffmanCodec::Status::Corrupt;
+        << codedContainer("ab", {{'a', "01"}, {'b', "01"}}) << Corrupt << QByteArray();
     QTest::newRow("code of no bits")
-        << codedContainer("a", {{'a', ""}, {'b', "1"}}) << HuffmanCodec::Status::Corrupt;
+        << codedContainer("a", {{'a', ""}, {'b', "1"}}) << Corrupt << QByteArray();
     QByteArray strayBits = codedContainer("ab", {{'a', "00"}, {'b', "01"}});
     strayBits.back() = char(0xFF); // "11" is no code
-    QTest::newRow("data leads outside the codes") << strayBits << HuffmanCodec::Status::Corrupt;
+    QTest::newRow("data leads outside the codes") << strayBits << Corrupt << QByteArray();
     QByteArray tooManyValues = good;
     tooManyValues[9] = char(0x01);
     tooManyValues[10] = char(0x01); // 257 values
-    QTest::newRow("more values than bytes have") << tooManyValues << HuffmanCodec::Status::Corrupt;
-    QByteArray checkByte = good;
-    checkByte[4] = char(checkByte[4] ^ 1);
-    QTest::newRow("check byte wrong") << checkByte << HuffmanCodec::Status::ChecksumMismatch;
+    QTest::newRow("more values than bytes have") << tooManyValues << Corrupt << QByteArray();
+    // A wrong check byte is a row of the password cipher test, through the whole cipher.
 }
 
-void TestHuffmanCodec::refusesDamagedContainers()
+void TestHuffmanCodec::decodesWhatItIsGiven()
 {
     QFETCH(QByteArray, container);
     QFETCH(HuffmanCodec::Status, status);
-    QCOMPARE(HuffmanCodec::decode(container).status, status);
+    QFETCH(QByteArray, plain);
+    const HuffmanCodec::Decoded decoded = HuffmanCodec::decode(container);
+    QCOMPARE(decoded.status, status);
+    if (status == HuffmanCodec::Status::Ok)
+        QCOMPARE(decoded.bytes, plain);
 }
 
 QTEST_GUILESS_MAIN(TestHuffmanCodec)

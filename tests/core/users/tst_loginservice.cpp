@@ -3,7 +3,6 @@
 
 #include "users/loginservice.h"
 
-#include <QSqlQuery>
 #include <QTest>
 
 using namespace Qt::StringLiterals;
@@ -27,19 +26,9 @@ void TestLoginService::initTestCase()
 {
     QVERIFY(m_workspace.configure());
     QVERIFY(m_workspace.connect());
-    QSqlQuery query(m_workspace.context().mainDatabase().database());
-    for (const auto &[name, password, type, fields] :
-         {std::tuple{u"bob"_s, u"Secret1"_s, 0, u"1,2#13"_s},
-          std::tuple{u"O'Brien"_s, u"pw"_s, 1, u"#"_s}, std::tuple{u"ann_1"_s, u"x"_s, 0, u""_s},
-          std::tuple{u"annA1"_s, u"y"_s, 0, u""_s}}) {
-        query.prepare(
-            u"INSERT INTO Users (UserName, Password, Type, Fields) VALUES (?, ?, ?, ?)"_s);
-        query.addBindValue(name);
-        query.addBindValue(password);
-        query.addBindValue(type);
-        query.addBindValue(fields);
-        QVERIFY(query.exec());
-    }
+    QVERIFY(m_workspace.exec(u"INSERT INTO Users (UserName, Password, Type, Fields) VALUES "
+                             u"('bob', 'Secret1', 0, '1,2#13'), ('O''Brien', 'pw', 1, '#'), "
+                             u"('ann_1', 'x', 0, ''), ('annA1', 'y', 0, '')"_s));
 }
 
 void TestLoginService::credentials_data()
