@@ -4,9 +4,7 @@
 #include "cipher/passwordcipher.h"
 #include "common/settings.h"
 #include "database/sqliteconnection.h"
-#include "sources/companyfile.h"
 
-#include <QCryptographicHash>
 #include <QDir>
 #include <QImage>
 #include <QJsonArray>
@@ -39,7 +37,6 @@ class TestCli : public QObject
 
 private Q_SLOTS:
     void passwordRoundTrip();
-    void demoIsTheSameEveryTime();
     void produceCsv();
     void produceJsonWithComparison();
     void produceRespectsTheUsersLines();
@@ -79,39 +76,6 @@ QString TestCli::demoFolder()
     if (!m_demoMade)
         m_demoMade = run({u"make-demo"_s, folder}).exitCode == 0;
     return folder;
-}
-
-namespace {
-
-QByteArray journalDigest(const QString &companyFile)
-{
-    SqliteConnection connection;
-    if (CompanyFile::open(connection, companyFile))
-        return {};
-    QSqlQuery query(connection.database());
-    query.exec(
-        u"SELECT a.AccountNumber, j.TransactionDate, j.TaxExclusiveAmount, j.Memo "
-        u"FROM JournalRecords j JOIN Accounts a USING (AccountID) ORDER BY j.JournalRecordID"_s);
-    QCryptographicHash hash(QCryptographicHash::Sha256);
-    int rows = 0;
-    while (query.next()) {
-        for (int i = 0; i < 4; ++i)
-            hash.addData(query.value(i).toString().toUtf8() + '\t');
-        ++rows;
-    }
-    return rows > 10000 ? hash.result().toHex() : QByteArray();
-}
-
-} // namespace
-
-void TestCli::demoIsTheSameEveryTime()
-{
-    const QString again = m_dir.filePath(u"demo-again"_s);
-    QCOMPARE(run({u"make-demo"_s, again}).exitCode, 0);
-    const QString name = u"/Harbour Panel & Paint.myo"_s;
-    const QByteArray first = journalDigest(demoFolder() + name);
-    QVERIFY(!first.isEmpty());
-    QCOMPARE(journalDigest(again + name), first);
 }
 
 void TestCli::produceCsv()
