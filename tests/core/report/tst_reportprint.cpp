@@ -82,7 +82,6 @@ private Q_SLOTS:
     void printableHtml();
     void picturesKeepTheirSize_data();
     void picturesKeepTheirSize();
-    void printsHeaderFooterAndPages();
     void backgroundsAndPicture();
 
 private:
@@ -178,34 +177,6 @@ void TestReportPrint::picturesKeepTheirSize()
     ReportRenderer::showPicturesAtTheirSize(document, pageWidth);
     document.setTextWidth(1000);
     QCOMPARE(std::round(document.idealWidth()), std::round(shownWidth));
-}
-
-void TestReportPrint::printsHeaderFooterAndPages()
-{
-    const QString pdf = m_folder.filePath(u"pages.pdf"_s);
-    PrintOptions options;
-    options.marginTopInches = 0.5;
-    options.marginLeftInches = options.marginRightInches = 0.4;
-    options.header = u"1/07/2025 to 30/06/2026&b&d"_s;
-    options.footer = u"&bPage &p of &P"_s;
-    options.locale = QLocale(QLocale::English, QLocale::Australia);
-    int pages = 0;
-    {
-        QPdfWriter writer(pdf);
-        writer.setPageSize(QPageSize(QPageSize::A4));
-        pages = ReportRenderer(tablePage(150), m_folder.path())
-                    .print(writer, options, QDate(2026, 12, 6));
-    }
-    QVERIFY(pages >= 2);
-    const QString text = pdfText(pdf);
-    QVERIFY(text.contains(u"1/07/2025 to 30/06/2026"_s));
-    QVERIFY(text.contains(u"6/12/26"_s));
-    QVERIFY(text.contains(u"Page 1 of %1"_s.arg(pages)));
-    QVERIFY(text.contains(u"Page %1 of %1"_s.arg(pages)));
-    // The first row is the table's heading: it is repeated at the top of every page.
-    QCOMPARE(text.count(u"Line 1 "_s), pages);
-    QVERIFY(text.contains(u"Line 150"_s));
-    QCOMPARE(text.count(u'\f'), pages);
 }
 
 void TestReportPrint::backgroundsAndPicture()
