@@ -15,7 +15,6 @@ class TestCacheFile : public QObject
 
 private Q_SLOTS:
     void roundTrip();
-    void missingFileAddsNothing();
     void unwritableTargetFails();
     void survivesACrashWhileWriting();
 };
@@ -43,14 +42,6 @@ void TestCacheFile::roundTrip()
     QCOMPARE(back.fieldValues, data.slot(0).fieldValues);
     QCOMPARE(back.fieldAbs, data.slot(0).fieldAbs);
     QCOMPARE(back.fieldTypes, data.slot(0).fieldTypes);
-}
-
-void TestCacheFile::missingFileAddsNothing()
-{
-    QTemporaryDir dir;
-    PeriodDataSet::Slot slot;
-    QCOMPARE(CacheFile::read(dir.filePath(u"none.db"_s), slot), std::nullopt);
-    QVERIFY(slot.isEmpty());
 }
 
 void TestCacheFile::unwritableTargetFails()
