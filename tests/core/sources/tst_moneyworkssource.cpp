@@ -49,7 +49,6 @@ class TestMoneyWorksSource : public QObject
 
 private Q_SLOTS:
     void initTestCase();
-    void textsSentToMoneyWorks();
     void countJobReferences_data();
     void countJobReferences();
     void figuresThroughTheServer();
@@ -106,18 +105,6 @@ std::unique_ptr<MoneyWorksSource> TestMoneyWorksSource::serverSource(const QStri
         });
 }
 
-void TestMoneyWorksSource::textsSentToMoneyWorks()
-{
-    auto source = serverSource(QString(), QString(), m_simulator.port());
-    QCOMPARE(source->movementExpression(u"4-1100"_s, QDate(2025, 7, 1), QDate(2025, 7, 31)),
-             u"GetMovement(`accountcode = \\\"4-1100\\\"`, '1/7/25 ', '31/7/25')"_s);
-    // Codes go in unescaped: a quote in one changes the expression.
-    QCOMPARE(source->movementExpression(u"4\"11"_s, QDate(2025, 7, 1), QDate(2025, 7, 1)),
-             u"GetMovement(`accountcode = \\\"4\"11\\\"`, '1/7/25 ', '1/7/25')"_s);
-    QCOMPARE(source->jobsSearch(QDate(2025, 7, 1), QDate(2025, 7, 31)),
-             u"type = `DI@` and transdate >= '1/7/25' and transdate <= '31/7/25'"_s);
-}
-
 void TestMoneyWorksSource::countJobReferences_data()
 {
     QTest::addColumn<QString>("text");
@@ -159,6 +146,8 @@ void TestMoneyWorksSource::figuresThroughTheServer()
     QCOMPARE(source->accountMovement(u"4-1100"_s, last, last), -234.56);
     QCOMPARE(source->accountMovement(u"5-1100"_s, first, last), 400.25);
     QCOMPARE(source->accountMovement(u"9-9999"_s, first, last), 0.0);
+    // The simulator takes only the expression and search texts MoneyWorks is sent; a quote in a
+    // code, which goes in unescaped, makes an expression it cannot evaluate.
     QCOMPARE(source->accountMovement(u"4\"1100"_s, first, last), 0.0);
     QCOMPARE(source->jobsCount(first, last), qint16(5));
     QCOMPARE(source->jobsCount(QDate(2025, 7, 2), QDate(2025, 7, 3)), qint16(2));
