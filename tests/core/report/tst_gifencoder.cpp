@@ -11,16 +11,11 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-qsizetype imageDataOffset(const QByteArray &gif)
-{
-    return gif.startsWith("GIF89a") ? 800 : 792;
-}
-
 // The sub-blocks of the image data joined, then read back as 9-bit codes up to the end code.
 QList<int> codesOf(const QByteArray &gif)
 {
     QByteArray data;
-    qsizetype at = imageDataOffset(gif);
+    qsizetype at = gif.startsWith("GIF89a") ? 800 : 792; // past the header and palette
     while (at < gif.size() && gif[at] != 0) {
         const int length = quint8(gif[at]);
         data.append(gif.mid(at + 1, length));
