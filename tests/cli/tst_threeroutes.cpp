@@ -180,7 +180,6 @@ CREATE TABLE Sales (SaleID integer PRIMARY KEY, Date date, InvoiceNumber text);
 QString TestThreeRoutes::writeSettings(const QString &name, const QHash<QString, QString> &changes)
 {
     const QString path = m_dir.filePath(name);
-    QFile::remove(path);
     QFile::copy(m_demo + u"/settings.ini"_s, path);
     SettingsStore store(path);
     for (auto it = changes.cbegin(); it != changes.cend(); ++it)
