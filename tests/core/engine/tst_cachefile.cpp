@@ -47,12 +47,10 @@ void TestCacheFile::roundTrip()
 void TestCacheFile::unwritableTargetFails()
 {
     QTemporaryDir dir;
-    PeriodDataSet::Slot slot;
-    slot.fieldIds << u"1"_s;
-    slot.fieldValues << u"1"_s;
-    slot.fieldAbs << u"1"_s;
-    slot.fieldTypes << u"0"_s;
-    QVERIFY(!CacheFile::write(dir.filePath(u"missing-folder/data.db"_s), slot));
+    const NumberFormat numbers(QLocale(QLocale::English, QLocale::Australia));
+    PeriodDataSet data(numbers);
+    data.storeFieldValue(1, 1.0, 0);
+    QVERIFY(!CacheFile::write(dir.filePath(u"missing-folder/data.db"_s), data.slot(0)));
 }
 
 void TestCacheFile::survivesACrashWhileWriting()
