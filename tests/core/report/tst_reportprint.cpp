@@ -155,7 +155,6 @@ void TestReportPrint::picturesKeepTheirSize_data()
     QTest::newRow("ordinary screen") << 1.0 << 0.0 << 400.0;
     QTest::newRow("twice as dense") << 2.0 << 0.0 << 200.0;
     QTest::newRow("one and a half") << 1.5 << 0.0 << 400.0 / 1.5;
-    QTest::newRow("wider than the page") << 1.0 << 300.0 << 300.0;
     QTest::newRow("dense and still too wide") << 1.25 << 300.0 << 300.0;
 }
 
