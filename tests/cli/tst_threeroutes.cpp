@@ -27,7 +27,9 @@ using namespace Qt::StringLiterals;
 
 namespace {
 
-const QString Range[] = {u"--from"_s, u"2025-07"_s, u"--to"_s, u"2026-06"_s};
+// The financial year with the two before it.
+const QStringList ThreeYears{u"--compare"_s, u"years"_s,   u"--count"_s, u"2"_s,
+                             u"--from"_s,    u"2025-07"_s, u"--to"_s,    u"2026-06"_s};
 
 int freePort()
 {
@@ -223,14 +225,10 @@ void TestThreeRoutes::everyRouteAloneAndAtOnce()
             const QString month = r == 3 ? u"2025-07"_s : u"2025-08"_s;
             const QString page = m_dir.filePath(u"report%1.html"_s.arg(r));
             QFile::remove(m_dir.filePath(u"report%1.bmp"_s.arg(r)));
-            if (r < 3)
-                start(runs[r], QStringList{u"produce"_s} + account +
-                                       QStringList{u"--compare"_s, u"years"_s, u"--count"_s, u"2"_s}
-                                   << Range[0] << Range[1] << Range[2] << Range[3]);
-            else
-                start(runs[r],
-                      QStringList{u"report"_s} + account +
-                          QStringList{u"--from"_s, month, u"--to"_s, month, u"--out"_s, page});
+            const QStringList range =
+                r < 3 ? ThreeYears
+                      : QStringList{u"--from"_s, month, u"--to"_s, month, u"--out"_s, page};
+            start(runs[r], QStringList{r < 3 ? u"produce"_s : u"report"_s} + account + range);
             if (!atOnce)
                 runs[r].waitForFinished(300000);
         }
