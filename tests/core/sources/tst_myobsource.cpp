@@ -76,9 +76,6 @@ void TestMyobSource::connectionText()
     QCOMPARE(MyobSource::connectionText(settings),
              u"Driver={MYOAU0901}; TYPE=MYOB; UID=Administrator; PWD=pa;ss; "
              u"DATABASE=C:\\MYOB\\Clearwater.myo;"_s);
-    QVERIFY(!MyobSource::usesBuiltInEngine(settings));
-    settings.accFileDriver = u"SQLite"_s;
-    QVERIFY(MyobSource::usesBuiltInEngine(settings));
 }
 
 void TestMyobSource::sqlDates_data()
