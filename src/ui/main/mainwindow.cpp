@@ -215,8 +215,6 @@ QWidget *MainWindow::buildKpiPanel()
     m_tabView = new KpiTabView(m_context, m_kpiPanel);
     // Beside the tab's caption rather than the tab buttons, so that a narrow screen keeps both.
     m_tabView->setCaptionCompanion(legend);
-    // The Field's name takes the width the figures leave, as the window is resized.
-    m_tabView->lstGrid()->setFittedColumn(m_tabView->grid().columnIndex(u"label"_s));
     auto *layout = new QVBoxLayout(m_kpiPanel);
     layout->addLayout(dates);
     layout->addLayout(tabs);

@@ -58,8 +58,6 @@ CompareWindow::CompareWindow(AppContext &context, ComparisonRanges::Kind kind, i
     menu->addAction(u"&Close"_s, this, &QDialog::accept);
 
     connect(m_tabButtons, &TabButtons::tabClicked, this, &CompareWindow::selectTab);
-    // The Field's name takes the width the period columns leave.
-    m_tabView->lstGrid()->setFittedColumn(m_tabView->grid().columnIndex(u"label"_s));
     auto *layout = new QVBoxLayout(this);
     layout->setMenuBar(menu);
     layout->addWidget(m_tabButtons);

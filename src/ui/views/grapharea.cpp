@@ -45,7 +45,7 @@ QSize GraphArea::sizeHint() const
             toPixelsY(ScaleLines[0]) + fontMetrics().height() + 6};
 }
 
-void GraphArea::setBars(const QList<BarSpec> &specs, bool compare, int /*periods*/)
+void GraphArea::setBars(const QList<BarSpec> &specs, bool compare)
 {
     m_compare = compare;
     qDeleteAll(m_bars);

@@ -30,7 +30,7 @@ public:
 
     // Replaces the bars. In a comparison of periods (the produced one and the earlier ones)
     // the bars of one Field touch, carry no labels and share the graph's width.
-    void setBars(const QList<BarSpec> &bars, bool compare, int periods = 1);
+    void setBars(const QList<BarSpec> &bars, bool compare);
     const QList<BarGraphItem *> &bars() const { return m_bars; }
     const QList<QLabel *> &variantLabels() const { return m_labels; }
     const QList<QLabel *> &nameLabels() const { return m_names; }

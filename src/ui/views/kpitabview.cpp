@@ -89,7 +89,7 @@ void KpiTabView::showTab(int tab)
                                        m_grid.cellText(row, labelColumn),
                                        m_pastCount > 0 ? periodName(bar.slot) : QString()};
         }
-        m_graph->setBars(bars, m_pastCount > 0, m_pastCount + 1);
+        m_graph->setBars(bars, m_pastCount > 0);
     }
     m_graph->setVisible(tab == TabViewBuilder::SummaryTab);
 }
@@ -111,7 +111,7 @@ QString KpiTabView::periodName(int slot) const
 void KpiTabView::clear()
 {
     m_grid.clear();
-    m_graph->setBars({}, m_pastCount > 0, m_pastCount + 1);
+    m_graph->setBars({}, m_pastCount > 0);
     m_tooltip->hide();
     m_caption->clear();
 }
